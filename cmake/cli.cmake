@@ -1,0 +1,44 @@
+# The command-line host "brakmorph": the portable host logic and the Linux
+# platform layer in a static library (the tests link it too), and the
+# executable, which lands in ${CMAKE_BINARY_DIR}/bin so that its default
+# plug-in path <bin>/../vst/Brakmorph.so finds the module built beside it.
+get_filename_component(BRAKMORPH_CLI_ROOT ${CMAKE_CURRENT_LIST_DIR}/.. ABSOLUTE)
+
+find_package(PkgConfig QUIET)
+if(PKG_CONFIG_FOUND)
+  pkg_check_modules(SNDFILE QUIET IMPORTED_TARGET sndfile)
+endif()
+if(TARGET PkgConfig::SNDFILE)
+  set(BRAKMORPH_SNDFILE_LIB PkgConfig::SNDFILE)
+else()
+  find_library(BRAKMORPH_SNDFILE_LIB sndfile REQUIRED)
+endif()
+
+file(GLOB CLI_SOURCES CONFIGURE_DEPENDS ${BRAKMORPH_CLI_ROOT}/cli/*.cpp
+     ${BRAKMORPH_CLI_ROOT}/cli/linux/*.cpp)
+list(REMOVE_ITEM CLI_SOURCES ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
+
+add_library(brakmorph_cli STATIC ${CLI_SOURCES})
+target_include_directories(brakmorph_cli PUBLIC ${BRAKMORPH_CLI_ROOT} ${BRAKMORPH_CLI_ROOT}/src)
+target_link_libraries(brakmorph_cli PUBLIC ${BRAKMORPH_SNDFILE_LIB} ${CMAKE_DL_LIBS})
+
+add_executable(brakmorph ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
+target_link_libraries(brakmorph PRIVATE brakmorph_cli)
+set_target_properties(brakmorph PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+
+# Once every file of the tree is read: the test binary unit-tests the host
+# logic and runs the host on the fake plug-in (tests/cli/fake_plugin), whose
+# paths it receives as compile definitions.
+function(brakmorph_cli_wire_tests)
+  if(NOT TARGET brakmorph_tests)
+    return()
+  endif()
+  target_link_libraries(brakmorph_tests PRIVATE brakmorph_cli)
+  if(TARGET FakeGain AND TARGET FakeGainMainOnly)
+    add_dependencies(brakmorph_tests FakeGain FakeGainMainOnly)
+    target_compile_definitions(brakmorph_tests PRIVATE
+      BRAKMORPH_TEST_FAKE_PLUGIN="$<TARGET_FILE:FakeGain>"
+      BRAKMORPH_TEST_FAKE_PLUGIN_MAIN_ONLY="$<TARGET_FILE:FakeGainMainOnly>")
+  endif()
+endfunction()
+cmake_language(DEFER DIRECTORY ${CMAKE_SOURCE_DIR} CALL brakmorph_cli_wire_tests)

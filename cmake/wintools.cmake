@@ -1,0 +1,17 @@
+# Windows test host: renders raw audio through a plug-in DLL, linked
+# statically so it runs under any Windows or Wine without the toolchain's DLLs.
+get_filename_component(BRAKMORPH_WINTOOLS_ROOT ${CMAKE_CURRENT_LIST_DIR}/.. ABSOLUTE)
+
+add_executable(win_render_host
+  ${BRAKMORPH_WINTOOLS_ROOT}/tests/windows/win_render_host.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/host_callback.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/hosted_plugin.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/param_lookup.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/render_loop.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/raw_audio.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/win32/dynamic_module_win32.cpp)
+target_include_directories(win_render_host PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
+                           ${BRAKMORPH_WINTOOLS_ROOT}/src)
+target_link_options(win_render_host PRIVATE -static -static-libgcc -static-libstdc++)
+set_target_properties(win_render_host PROPERTIES SUFFIX ".exe"
+                      RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
