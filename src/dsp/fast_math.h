@@ -17,7 +17,10 @@ inline float fast_log2(float v) {
   std::memcpy(&m, &mbits, sizeof m);
   const float third = 1.0f / 3.0f;
   const float two_thirds = 2.0f / 3.0f;
-  return float(e - 128) + (2.0f - m * third) * m - two_thirds;
+  // Mantissa polynomial first, exponent last: whole octaves then stay exact
+  // instead of losing the polynomial's low bits to a large exponent.
+  const float mantissa_part = (2.0f - m * third) * m - two_thirds;
+  return mantissa_part + float(e - 128);
 }
 
 // Expected within -126..127. Below -126 (and NaN) gives 0; 128 and above give
