@@ -3,7 +3,7 @@ find_package(GTest REQUIRED)
 include(GoogleTest)
 
 file(GLOB_RECURSE TEST_SOURCES CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/tests/*.cpp)
-list(FILTER TEST_SOURCES EXCLUDE REGEX "/tests/(support|windows)/")
+list(FILTER TEST_SOURCES EXCLUDE REGEX "/tests/(support|windows|realtime|integration|cli/fake_plugin)/")
 file(GLOB TEST_SUPPORT_SOURCES CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/tests/support/*.cpp)
 
 add_executable(brakmorph_tests ${TEST_SOURCES} ${TEST_SUPPORT_SOURCES})
@@ -11,7 +11,51 @@ target_include_directories(brakmorph_tests PRIVATE ${CMAKE_SOURCE_DIR}/tests ${C
 target_link_libraries(brakmorph_tests PRIVATE brakmorph_core brakmorph_resources GTest::gtest GTest::gtest_main pthread)
 target_compile_definitions(brakmorph_tests PRIVATE
   BRAKMORPH_TEST_PLUGIN="$<TARGET_FILE:Brakmorph>"
-  BRAKMORPH_TEST_CLI="$<TARGET_FILE:brakmorph>"
   BRAKMORPH_GEN_DIR="${BRAKMORPH_GEN_DIR}")
-add_dependencies(brakmorph_tests Brakmorph brakmorph)
+add_dependencies(brakmorph_tests Brakmorph)
+if(TARGET brakmorph)
+  target_compile_definitions(brakmorph_tests PRIVATE BRAKMORPH_TEST_CLI="$<TARGET_FILE:brakmorph>")
+  add_dependencies(brakmorph_tests brakmorph)
+endif()
 gtest_discover_tests(brakmorph_tests DISCOVERY_TIMEOUT 60 PROPERTIES LABELS unit)
+
+# Real-time safety of the audio path: its own executable, because it replaces
+# malloc, operator new and the mutex calls process-wide. A sanitizer runtime
+# replaces the same functions, so sanitized trees leave it out.
+if(NOT BRAKMORPH_SANITIZE)
+  file(GLOB REALTIME_TEST_SOURCES CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/tests/realtime/*.cpp)
+  add_executable(realtime_tests ${REALTIME_TEST_SOURCES})
+  target_include_directories(realtime_tests PRIVATE ${CMAKE_SOURCE_DIR}/tests ${CMAKE_SOURCE_DIR}/src)
+  target_link_libraries(realtime_tests PRIVATE GTest::gtest GTest::gtest_main pthread ${CMAKE_DL_LIBS})
+  target_compile_definitions(realtime_tests PRIVATE BRAKMORPH_TEST_PLUGIN="$<TARGET_FILE:Brakmorph>")
+  # Export the replacements so a dlopen'ed module binds to them.
+  set_target_properties(realtime_tests PROPERTIES ENABLE_EXPORTS ON)
+  add_dependencies(realtime_tests Brakmorph)
+  gtest_discover_tests(realtime_tests DISCOVERY_TIMEOUT 60 PROPERTIES LABELS realtime)
+endif()
+
+# Integration with the outside world: the Windows builds under Wine, a
+# third-party host's plug-in scanner, and the command-line host on a
+# third-party plug-in. Each script exits 77 (skipped) when what it needs is
+# not installed.
+set(BRAKMORPH_WINDOWS_BUILDS "" CACHE STRING "Build folders of the Windows plug-ins, a ;-list")
+add_executable(raw_signal_tool ${CMAKE_SOURCE_DIR}/tests/integration/raw_signal_tool.cpp)
+if(TARGET brakmorph)
+  string(REPLACE ";" ":" BRAKMORPH_WINDOWS_BUILD_PATH "${BRAKMORPH_WINDOWS_BUILDS}")
+  set(INTEGRATION_DIR ${CMAKE_SOURCE_DIR}/tests/integration)
+  set(INTEGRATION_WORK ${CMAKE_BINARY_DIR}/integration)
+  add_test(NAME integration.wine_cross_build
+           COMMAND bash ${INTEGRATION_DIR}/wine_cross_build.sh
+                   --cli $<TARGET_FILE:brakmorph> --tool $<TARGET_FILE:raw_signal_tool>
+                   --plugin $<TARGET_FILE:Brakmorph> --work ${INTEGRATION_WORK}/wine
+                   --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}")
+  add_test(NAME integration.ardour_scan
+           COMMAND bash ${INTEGRATION_DIR}/ardour_scan.sh
+                   --plugin $<TARGET_FILE:Brakmorph> --work ${INTEGRATION_WORK}/ardour)
+  add_test(NAME integration.lsp_bench
+           COMMAND bash ${INTEGRATION_DIR}/lsp_bench.sh --cli $<TARGET_FILE:brakmorph>)
+  set_tests_properties(integration.wine_cross_build integration.ardour_scan integration.lsp_bench
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77)
+  set_tests_properties(integration.wine_cross_build PROPERTIES TIMEOUT 900)
+  set_tests_properties(integration.ardour_scan integration.lsp_bench PROPERTIES TIMEOUT 300)
+endif()

@@ -1,0 +1,62 @@
+#include "host/instance_factory.h"
+
+#include <exception>
+#include <memory>
+#include <stdexcept>
+
+#include "config/system_services.h"
+#include "dsp/brakmorph_dsp.h"
+#include "host/host_dsp_vst2_win.h"
+#include "host/vst2_win_plugin.h"
+#include "presets/bank_file.h"
+
+namespace plugcore {
+
+namespace {
+
+constexpr int32_t kUniqueId = 0x56626D78;  // 'Vbmx'
+const char kSettingKey[] = "Velmora\\Brakmorph VST2";
+
+BankManager load_static_bank() {
+  const sys::Resource resource = sys::get_resource("VLPB", "static_presets");
+  BankManager bank;
+  if (!resource || load_bank_mem(resource.data, static_cast<int>(resource.size), bank, false) != 0) {
+    throw std::runtime_error("plugcore::create_instance() : Cannot load the static bank.");
+  }
+  return bank;
+}
+
+}  // namespace
+
+AEffect* create_instance(Vst2HostCallback host) {
+  if (host == nullptr || host(nullptr, audioMasterVersion, 0, 0, nullptr, 0.0f) == 0) {
+    return nullptr;
+  }
+  std::unique_ptr<BrakmorphDsp> dsp;
+  std::unique_ptr<HostDspVst2Win> host_dsp;
+  Vst2WinPlugin* plugin = nullptr;
+  try {
+    dsp = std::make_unique<BrakmorphDsp>();
+    host_dsp = std::make_unique<HostDspVst2Win>();
+    const BankManager static_bank = load_static_bank();
+
+    MidiReceiverInterface* receiver = dsp.get();
+    plugin = new Vst2WinPlugin(host, dsp.get(), nullptr, receiver, static_bank, kUniqueId);
+    BrakmorphDsp* engine = dsp.release();  // the plug-in owns the engine from here
+
+    host_dsp->set_plugin(plugin);
+    engine->set_host_dsp(host_dsp.release());  // the engine owns its adapter
+
+    plugin->set_setting_key(kSettingKey);
+    plugin->init_instance();
+    plugin->set_default_state();
+    return plugin->getAeffect();
+  } catch (const std::exception& error) {
+    sys::debug_output(error.what());
+    sys::debug_output("\n");
+    delete plugin;
+    return nullptr;
+  }
+}
+
+}  // namespace plugcore

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <atomic>
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "host/vst2_abi.h"
+
+// A scriptable host for in-process tests of the plug-in core. The callback is a
+// plain function, so one MockHost is "current" at a time per test.
+struct MockHost {
+  intptr_t version = 2400;
+  intptr_t automatable = 0;
+  intptr_t quantization = 0;
+  intptr_t can_size_window = 0;
+  bool second_input_connected = true;
+  bool second_output_connected = true;
+  bool time_info = true;
+  double tempo = 120.0;
+
+  struct Automation {
+    int32_t index;
+    float value;
+  };
+  std::vector<Automation> automations;
+  std::atomic<int> want_midi_calls{0};
+  std::atomic<int> update_display_calls{0};
+  std::atomic<int> get_time_calls{0};
+  std::atomic<int32_t> last_time_filter{-1};
+
+  MockHost();
+  ~MockHost();
+  static intptr_t VST2_CALL callback(AEffect* effect, int32_t opcode, int32_t index, intptr_t value, void* ptr,
+                                      float opt);
+};
+
+// Dispatcher shorthand.
+intptr_t dispatch(AEffect* effect, int32_t opcode, int32_t index = 0, intptr_t value = 0, void* ptr = nullptr,
+                  float opt = 0.0f);
+std::string param_text(AEffect* effect, int32_t opcode, int32_t index);
+// Opens and switches on an instance the way hosts do.
+void open_and_resume(AEffect* effect, float rate, int32_t block);
+void close_instance(AEffect* effect);
