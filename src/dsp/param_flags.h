@@ -1,0 +1,27 @@
+#pragma once
+
+#include "params/normalized_param_interface.h"
+
+// Switches of the whole effect: on when the normalised value reaches one half.
+
+class ParamStereoBoostingFlag : public plugcore::NormalizedParamInterface {
+ public:
+  void get_name(char* text, int capacity) const override;
+  void get_unit(char* text, int capacity) const override;
+  int get_type() const override { return 1; }
+  double conv_norm_to_value(float norm) const override;
+  float conv_value_to_norm(double value) const override;
+  void conv_value_to_text(char* text, int capacity, double value) const override;
+  double conv_text_to_value(const char* text, bool& ok) const override;
+};
+
+class ParamOverSamplingFlag : public plugcore::NormalizedParamInterface {
+ public:
+  void get_name(char* text, int capacity) const override;
+  void get_unit(char* text, int capacity) const override;
+  int get_type() const override { return 1; }
+  double conv_norm_to_value(float norm) const override;
+  float conv_value_to_norm(double value) const override;
+  void conv_value_to_text(char* text, int capacity, double value) const override;
+  double conv_text_to_value(const char* text, bool& ok) const override;
+};
