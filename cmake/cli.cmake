@@ -26,6 +26,9 @@ add_executable(brakmorph ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
 target_link_libraries(brakmorph PRIVATE brakmorph_cli)
 set_target_properties(brakmorph PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
 
+# The fake plug-in the host's tests run on.
+include(${BRAKMORPH_CLI_ROOT}/tests/cli/fake_plugin/CMakeLists.txt)
+
 # Once every file of the tree is read: the test binary unit-tests the host
 # logic and runs the host on the fake plug-in (tests/cli/fake_plugin), whose
 # paths it receives as compile definitions.
