@@ -9,7 +9,7 @@ const long double kPiL = 3.141592653589793238462643383279502884L;
 
 std::vector<double> HalfBandDecimator::design(double attenuation_db, double transition) {
   if (!(transition > 0.0 && transition < 0.5) || !(attenuation_db > 0.0))
-    throw std::runtime_error("HalfBandDecimator::design() : Invalid filter specification.");
+    throw std::runtime_error("HalfBandDecimator::design() : Invalid attenuation or transition width.");
   const long double t = transition;
   const long double tk = std::tan((1.0L - 2.0L * t) * kPiL / 4.0L);
   const long double k = tk * tk;

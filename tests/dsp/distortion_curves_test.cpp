@@ -34,7 +34,7 @@ double curve(int c, double x) {
 
 struct Tabulated {
   int curve, h;
-  double f1, fm1, fh, fmh;  // published reference values
+  double f1, fm1, fh, fmh;  // reference values of the curve at 1, -1, h, -h
   double interp_bound;      // largest error of the cubic between knots
 };
 
