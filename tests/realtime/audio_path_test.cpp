@@ -84,7 +84,7 @@ std::vector<std::vector<float>> test_signal() {
 class AudioPathTest : public ::testing::Test {
  protected:
   void SetUp() override {
-    host_ = std::make_unique<rtcheck::QuietHost>(BRAKMORPH_TEST_PLUGIN, kSampleRate, kMaxBlock);
+    host_ = std::make_unique<plugcore::QuietHost>(BRAKMORPH_TEST_PLUGIN, kSampleRate, kMaxBlock);
     ASSERT_TRUE(host_->error().empty()) << host_->error();
     ASSERT_EQ(host_->effect()->numInputs, 2);
     ASSERT_EQ(host_->effect()->numOutputs, 2);
@@ -103,7 +103,7 @@ class AudioPathTest : public ::testing::Test {
   }
 
   struct RunResult {
-    rtcheck::CallCounts counts;
+    sys::CallCounts counts;
     bool finite = true;
     double peak = 0.0;
   };
@@ -126,14 +126,14 @@ class AudioPathTest : public ::testing::Test {
       std::memset(outputs[1], 0, sizeof(float) * static_cast<size_t>(block));
       // A moving tempo makes the plug-in forward it inside the armed span.
       tempo += 0.25;
-      rtcheck::QuietHost::set_tempo(tempo);
-      rtcheck::arm();
+      plugcore::QuietHost::set_tempo(tempo);
+      sys::arm_call_counter();
       if (entry == Entry::replacing) {
         effect->processReplacing(effect, inputs, outputs, block);
       } else {
         effect->process(effect, inputs, outputs, block);
       }
-      const rtcheck::CallCounts counts = rtcheck::disarm();
+      const sys::CallCounts counts = sys::disarm_call_counter();
       add(result.counts, counts);
       for (int channel = 0; channel < 2; ++channel) {
         for (int i = 0; i < block; ++i) {
@@ -150,7 +150,7 @@ class AudioPathTest : public ::testing::Test {
     return result;
   }
 
-  static void add(rtcheck::CallCounts& sum, const rtcheck::CallCounts& more) {
+  static void add(sys::CallCounts& sum, const sys::CallCounts& more) {
     sum.operator_new += more.operator_new;
     sum.operator_delete += more.operator_delete;
     sum.c_alloc += more.c_alloc;
@@ -177,7 +177,7 @@ class AudioPathTest : public ::testing::Test {
     }
   }
 
-  std::unique_ptr<rtcheck::QuietHost> host_;
+  std::unique_ptr<plugcore::QuietHost> host_;
   std::vector<std::vector<float>> signal_;
   std::vector<std::vector<float>> outputs_;
 };
@@ -189,19 +189,19 @@ TEST_F(AudioPathTest, CounterSeesThePluginsOwnAllocations) {
   host_->suspend();
   host_->resume();
   void* chunk = nullptr;
-  rtcheck::arm();
+  sys::arm_call_counter();
   const intptr_t size = host_->dispatch(effGetChunk, 0, 0, &chunk);
-  const rtcheck::CallCounts counts = rtcheck::disarm();
+  const sys::CallCounts counts = sys::disarm_call_counter();
   ASSERT_GT(size, 0);
   ASSERT_NE(chunk, nullptr);
-  EXPECT_GT(counts.allocations(), 0) << rtcheck::describe(counts);
+  EXPECT_GT(counts.allocations(), 0) << sys::describe_calls(counts);
 }
 
 TEST_F(AudioPathTest, NoAllocationLockOrSystemCallInAnyProgramOrSetting) {
   const int programs = host_->effect()->numPrograms;
   ASSERT_GT(programs, 0);
-  rtcheck::QuietHost::reset_callback_counts();
-  rtcheck::CallCounts total;
+  plugcore::QuietHost::reset_callback_counts();
+  sys::CallCounts total;
   std::vector<std::string> faults;
   long cases = 0;
   for (int program = 0; program < programs; ++program) {
@@ -224,7 +224,7 @@ TEST_F(AudioPathTest, NoAllocationLockOrSystemCallInAnyProgramOrSetting) {
                                     configuration.name + ", block " + std::to_string(block) +
                                     (entry == Entry::replacing ? ", processReplacing" : ", process");
           if (result.counts.total() != 0 && faults.size() < 20) {
-            faults.push_back(where + ": " + rtcheck::describe(result.counts));
+            faults.push_back(where + ": " + sys::describe_calls(result.counts));
           }
           EXPECT_TRUE(result.finite) << where << ": non-finite output";
         }
@@ -239,9 +239,9 @@ TEST_F(AudioPathTest, NoAllocationLockOrSystemCallInAnyProgramOrSetting) {
   for (const std::string& fault : faults) {
     ADD_FAILURE() << fault;
   }
-  EXPECT_EQ(total.total(), 0) << "over " << cases << " cases: " << rtcheck::describe(total);
+  EXPECT_EQ(total.total(), 0) << "over " << cases << " cases: " << sys::describe_calls(total);
   // The counted spans included the plug-in's calls back into the host.
-  EXPECT_GT(rtcheck::QuietHost::callback_count(audioMasterGetTime), 0);
+  EXPECT_GT(plugcore::QuietHost::callback_count(audioMasterGetTime), 0);
 }
 
 TEST_F(AudioPathTest, SampleRateChangesKeepTheAudioPathQuiet) {
@@ -255,7 +255,7 @@ TEST_F(AudioPathTest, SampleRateChangesKeepTheAudioPathQuiet) {
     for (int block : {64, 4096}) {
       const RunResult result = run(Entry::replacing, block, 3 * kMaxBlock);
       EXPECT_EQ(result.counts.total(), 0)
-          << "rate " << rate << ", block " << block << ": " << rtcheck::describe(result.counts);
+          << "rate " << rate << ", block " << block << ": " << sys::describe_calls(result.counts);
       EXPECT_TRUE(result.finite) << "rate " << rate;
       EXPECT_GT(result.peak, 1e-4) << "rate " << rate;
     }
@@ -269,7 +269,7 @@ TEST_F(AudioPathTest, ParameterChangesBetweenBlocksAreAppliedWithoutAllocating) 
   const int params = effect->numParams;
   ASSERT_GT(params, 0);
   uint32_t state = 99u;
-  rtcheck::CallCounts total;
+  sys::CallCounts total;
   for (int step = 0; step < 400; ++step) {
     for (int write = 0; write < 4; ++write) {
       state = state * 1664525u + 1013904223u;
@@ -281,7 +281,7 @@ TEST_F(AudioPathTest, ParameterChangesBetweenBlocksAreAppliedWithoutAllocating) 
     add(total, result.counts);
     ASSERT_TRUE(result.finite) << "step " << step;
   }
-  EXPECT_EQ(total.total(), 0) << rtcheck::describe(total);
+  EXPECT_EQ(total.total(), 0) << sys::describe_calls(total);
 }
 
 }  // namespace

@@ -141,14 +141,14 @@ void release(void* pointer) noexcept {
 
 }  // namespace
 
-namespace rtcheck {
+namespace sys {
 
-void arm() {
+void arm_call_counter() {
   t_counts = RawCounts{0, 0, 0, 0, 0, 0};
   t_armed = true;
 }
 
-CallCounts disarm() {
+CallCounts disarm_call_counter() {
   t_armed = false;
   CallCounts counts;
   counts.operator_new = t_counts.operator_new;
@@ -160,14 +160,14 @@ CallCounts disarm() {
   return counts;
 }
 
-std::string describe(const CallCounts& counts) {
+std::string describe_calls(const CallCounts& counts) {
   return "new " + std::to_string(counts.operator_new) + ", delete " +
          std::to_string(counts.operator_delete) + ", malloc " + std::to_string(counts.c_alloc) +
          ", free " + std::to_string(counts.c_free) + ", mutex " +
          std::to_string(counts.mutex_lock) + ", syscall " + std::to_string(counts.system_call);
 }
 
-}  // namespace rtcheck
+}  // namespace sys
 
 // operator new and delete, every replaceable form.
 void* operator new(size_t size) { return allocate_or_throw(size); }

@@ -6,7 +6,7 @@
 
 #include <string>
 
-namespace rtcheck {
+namespace sys {
 
 struct CallCounts {
   long operator_new = 0;     // every form of operator new and new[]
@@ -23,12 +23,12 @@ struct CallCounts {
 };
 
 // Starts counting on the calling thread from zero.
-void arm();
+void arm_call_counter();
 
-// Stops counting on the calling thread and returns what was counted since arm().
-CallCounts disarm();
+// Stops counting on the calling thread and returns what was counted since arm_call_counter().
+CallCounts disarm_call_counter();
 
 // "new 0, delete 0, malloc 0, free 0, mutex 0, syscall 0"
-std::string describe(const CallCounts& counts);
+std::string describe_calls(const CallCounts& counts);
 
-}  // namespace rtcheck
+}  // namespace sys

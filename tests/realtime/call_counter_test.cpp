@@ -20,7 +20,7 @@ namespace {
 std::atomic<void*> g_sink{nullptr};
 
 TEST(CallCounter, CountsEveryOperatorNewForm) {
-  rtcheck::arm();
+  sys::arm_call_counter();
   auto* single = new int(7);
   g_sink = single;
   delete single;
@@ -36,14 +36,14 @@ TEST(CallCounter, CountsEveryOperatorNewForm) {
   auto* wide = new Wide;
   g_sink = wide;
   delete wide;
-  const rtcheck::CallCounts counts = rtcheck::disarm();
+  const sys::CallCounts counts = sys::disarm_call_counter();
   EXPECT_EQ(counts.operator_new, 4);
   EXPECT_EQ(counts.operator_delete, 4);
   EXPECT_EQ(counts.c_alloc, 0) << "operator new must not be counted twice";
 }
 
 TEST(CallCounter, CountsTheCAllocatorAndIgnoresFreeOfNull) {
-  rtcheck::arm();
+  sys::arm_call_counter();
   void* block = std::malloc(100);
   g_sink = block;
   block = std::realloc(block, 4000);
@@ -55,7 +55,7 @@ TEST(CallCounter, CountsTheCAllocatorAndIgnoresFreeOfNull) {
   std::free(zeroed);
   std::free(aligned);
   std::free(nullptr);
-  const rtcheck::CallCounts counts = rtcheck::disarm();
+  const sys::CallCounts counts = sys::disarm_call_counter();
   EXPECT_EQ(status, 0);
   EXPECT_EQ(reinterpret_cast<uintptr_t>(aligned) % 128, 0u);
   EXPECT_EQ(counts.c_alloc, 4);
@@ -63,14 +63,14 @@ TEST(CallCounter, CountsTheCAllocatorAndIgnoresFreeOfNull) {
 }
 
 TEST(CallCounter, StandardContainersAreCaught) {
-  rtcheck::arm();
+  sys::arm_call_counter();
   std::vector<float> grown;
   for (int i = 0; i < 100; ++i) {
     grown.push_back(static_cast<float>(i));
   }
   auto shared = std::make_shared<std::vector<int>>(5);
   shared.reset();
-  const rtcheck::CallCounts counts = rtcheck::disarm();
+  const sys::CallCounts counts = sys::disarm_call_counter();
   EXPECT_GE(counts.operator_new, 3);
   EXPECT_EQ(counts.operator_delete + 1, counts.operator_new)
       << "all but the vector's last buffer are released inside the armed span";
@@ -78,14 +78,14 @@ TEST(CallCounter, StandardContainersAreCaught) {
 
 TEST(CallCounter, CountsMutexLocksAndSystemCalls) {
   std::mutex mutex;
-  rtcheck::arm();
+  sys::arm_call_counter();
   mutex.lock();
   mutex.unlock();
   {
     std::lock_guard<std::mutex> guard(mutex);
   }
   const ssize_t written = write(-1, "x", 1);  // fails with EBADF, but it is a system call
-  const rtcheck::CallCounts counts = rtcheck::disarm();
+  const sys::CallCounts counts = sys::disarm_call_counter();
   EXPECT_EQ(written, -1);
   EXPECT_EQ(counts.mutex_lock, 2);
   EXPECT_EQ(counts.system_call, 1);
@@ -94,7 +94,7 @@ TEST(CallCounter, CountsMutexLocksAndSystemCalls) {
 TEST(CallCounter, CountsOnlyWhileArmedAndOnlyOnTheArmedThread) {
   void* before = std::malloc(8);  // not armed: not counted
   g_sink = before;
-  rtcheck::arm();
+  sys::arm_call_counter();
   long other_thread_allocations = 0;
   std::thread other([&other_thread_allocations] {
     // This thread was never armed; its allocations belong to nobody.
@@ -103,18 +103,18 @@ TEST(CallCounter, CountsOnlyWhileArmedAndOnlyOnTheArmedThread) {
       other_thread_allocations += *value >= 0 ? 1 : 0;
       delete value;
     }
-    rtcheck::arm();
+    sys::arm_call_counter();
     void* mine = std::malloc(16);
     g_sink = mine;
     std::free(mine);
-    const rtcheck::CallCounts own = rtcheck::disarm();
+    const sys::CallCounts own = sys::disarm_call_counter();
     other_thread_allocations = own.c_alloc == 1 && own.c_free == 1 ? 50 : -1;
   });
   other.join();
-  const rtcheck::CallCounts during_thread = rtcheck::disarm();
+  const sys::CallCounts during_thread = sys::disarm_call_counter();
   std::free(before);
-  rtcheck::arm();
-  const rtcheck::CallCounts quiet = rtcheck::disarm();
+  sys::arm_call_counter();
+  const sys::CallCounts quiet = sys::disarm_call_counter();
   EXPECT_EQ(other_thread_allocations, 50) << "the second thread counts its own armed span";
   EXPECT_EQ(quiet.total(), 0);
   // Starting the thread allocates its state on this thread; nothing the other

@@ -4,7 +4,7 @@
 
 #include <cstring>
 
-namespace rtcheck {
+namespace plugcore {
 namespace {
 
 constexpr int kOpcodeSlots = 64;
@@ -153,4 +153,4 @@ intptr_t VST2_CALL QuietHost::callback(AEffect*, int32_t opcode, int32_t, intptr
   }
 }
 
-}  // namespace rtcheck
+}  // namespace plugcore

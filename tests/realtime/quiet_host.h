@@ -9,7 +9,7 @@
 
 #include "host/vst2_abi.h"
 
-namespace rtcheck {
+namespace plugcore {
 
 class QuietHost {
  public:
@@ -47,4 +47,4 @@ class QuietHost {
   std::string error_;
 };
 
-}  // namespace rtcheck
+}  // namespace plugcore
