@@ -1,0 +1,22 @@
+#pragma once
+
+#include <cstdint>
+
+#include "guikit/message_handler_interface.h"
+#include "guikit/rect.h"
+
+namespace guikit {
+
+// One editor window: the two tree roots it paints and feeds with the mouse,
+// and the carrier of every upward message.
+class WindowInterface : public MessageHandlerInterface {
+ public:
+  ~WindowInterface() override = default;
+  virtual int32_t open(void* parent) = 0;
+  virtual void close() = 0;
+  virtual void resize() = 0;
+  virtual void set_roots(MessageHandlerInterface* background, MessageHandlerInterface* controls) = 0;
+  virtual void set_editor_size(Size size) = 0;
+};
+
+}  // namespace guikit
