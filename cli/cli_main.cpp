@@ -20,7 +20,7 @@ struct Command {
 const Command kCommands[] = {
     {"info", plugcore::run_info},   {"render", plugcore::run_render},
     {"demo", plugcore::run_demo},   {"bench", plugcore::run_bench},
-    {"bank", plugcore::run_bank},
+    {"bank", plugcore::run_bank},   {"validate", plugcore::run_validate},
 };
 
 bool wants_help(const std::vector<std::string>& args) {

@@ -16,6 +16,7 @@ int run_render(basic::ArgReader& args);
 int run_demo(basic::ArgReader& args);
 int run_bench(basic::ArgReader& args);
 int run_bank(basic::ArgReader& args);
+int run_validate(basic::ArgReader& args);
 
 // Help texts: the overview for an empty name, else the command's own; empty
 // when there is no such command.

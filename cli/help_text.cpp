@@ -25,6 +25,7 @@ const HelpEntry kHelp[] = {
      "  demo      render the demo signal through every program\n"
      "  bench     measure processing CPU time, several configurations side by side\n"
      "  bank      show the programs of a preset bank file\n"
+     "  validate  run the host-grade validation battery on a plug-in\n"
      "\n"
      "'brakmorph COMMAND --help' describes a command. Failures exit non-zero with\n"
      "a one-line reason (status 2 for a command-line mistake).\n"},
@@ -83,6 +84,17 @@ const HelpEntry kHelp[] = {
      "affects every configuration alike. Example:\n"
      "  brakmorph bench --case \"plain:program=3\" \\\n"
      "                  --case \"os:program=3,set=Oversampling=On\"\n"},
+    {"validate",
+     "usage: brakmorph validate [--plugin P] [--strictness 1..10] [--seed N] [--only G,G] [--json]\n"
+     "\n"
+     "Drives the plug-in the way the strictest hosts do and prints one line per\n"
+     "check (PASS, FAIL or SKIP with the reason), then \"N passed, N failed\".\n"
+     "Exits 1 when any check failed. Groups: lifecycle, dispatcher, audio,\n"
+     "threads, state, realtime.\n"
+     "  --strictness  how many trials each check makes (10, the default, is the most)\n"
+     "  --seed        seed of every random choice (default 1)\n"
+     "  --only        run only the named groups\n"
+     "  --json        the results as one JSON object\n"},
     {"bank",
      "usage: brakmorph bank show FILE.pbk [--plugin P]\n"
      "\n"

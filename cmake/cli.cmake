@@ -15,19 +15,31 @@ else()
 endif()
 
 file(GLOB CLI_SOURCES CONFIGURE_DEPENDS ${BRAKMORPH_CLI_ROOT}/cli/*.cpp
-     ${BRAKMORPH_CLI_ROOT}/cli/linux/*.cpp)
+     ${BRAKMORPH_CLI_ROOT}/cli/linux/*.cpp
+     ${BRAKMORPH_CLI_ROOT}/cli/validate/*.cpp ${BRAKMORPH_CLI_ROOT}/cli/validate/linux/*.cpp)
 list(REMOVE_ITEM CLI_SOURCES ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
 
 add_library(brakmorph_cli STATIC ${CLI_SOURCES})
 target_include_directories(brakmorph_cli PUBLIC ${BRAKMORPH_CLI_ROOT} ${BRAKMORPH_CLI_ROOT}/src)
-target_link_libraries(brakmorph_cli PUBLIC ${BRAKMORPH_SNDFILE_LIB} ${CMAKE_DL_LIBS})
+find_package(Threads REQUIRED)
+target_link_libraries(brakmorph_cli PUBLIC ${BRAKMORPH_SNDFILE_LIB} ${CMAKE_DL_LIBS} Threads::Threads)
 
 add_executable(brakmorph ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
 target_link_libraries(brakmorph PRIVATE brakmorph_cli)
 set_target_properties(brakmorph PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+# validate counts the allocations and locks of a plug-in's audio entries with
+# the real-time tests' interposer, exported so a dlopen'ed module binds to it.
+# A sanitizer runtime replaces the same functions, so sanitized trees go without.
+if(NOT BRAKMORPH_SANITIZE)
+  target_sources(brakmorph PRIVATE ${BRAKMORPH_CLI_ROOT}/tests/realtime/call_counter.cpp)
+  target_include_directories(brakmorph PRIVATE ${BRAKMORPH_CLI_ROOT}/tests)
+  set_target_properties(brakmorph PROPERTIES ENABLE_EXPORTS ON)
+endif()
 
 # The fake plug-in the host's tests run on.
 include(${BRAKMORPH_CLI_ROOT}/tests/cli/fake_plugin/CMakeLists.txt)
+# The faulty plug-in the validation battery's tests run on.
+include(${BRAKMORPH_CLI_ROOT}/tests/validate/fake_plugin/CMakeLists.txt)
 
 # Once every file of the tree is read: the test binary unit-tests the host
 # logic and runs the host on the fake plug-in (tests/cli/fake_plugin), whose
