@@ -7,9 +7,10 @@ WIN32_DIR := build/win32
 WIN64_DIR := build/win64
 ASAN := build/asan
 FUZZ := build/fuzz
+TSAN := build/tsan
 GEN := $(CURDIR)/$(LINUX)/gen
 
-.PHONY: all setup linux win32 win64 windows asan fuzz demo test test-unit test-asan test-fuzz install clean
+.PHONY: all setup linux win32 win64 windows asan tsan fuzz demo test test-unit test-asan test-tsan test-fuzz install clean
 
 all: linux windows
 
@@ -34,6 +35,11 @@ asan:
 	cmake -S . -B $(ASAN) -DCMAKE_BUILD_TYPE=Debug -DBRAKMORPH_SANITIZE=address,undefined -DCMAKE_CXX_FLAGS=-O1
 	cmake --build $(ASAN) -j$(JOBS)
 
+# ThreadSanitizer: the host and the plug-ins only, for the threaded checks of validate.
+tsan:
+	cmake -S . -B $(TSAN) -DCMAKE_BUILD_TYPE=Debug -DBRAKMORPH_SANITIZE=thread -DCMAKE_CXX_FLAGS=-O1 -DBUILD_TESTING=OFF
+	cmake --build $(TSAN) -j$(JOBS) --target brakmorph Brakmorph ValidateFaulty
+
 fuzz:
 	cmake -S fuzz -B $(FUZZ) -DCMAKE_CXX_COMPILER=clang++ -DCMAKE_C_COMPILER=clang
 	cmake --build $(FUZZ) -j$(JOBS)
@@ -48,12 +54,16 @@ test-asan: asan
 	cd $(ASAN) && ASAN_OPTIONS=detect_leaks=1 UBSAN_OPTIONS=halt_on_error=1:print_stacktrace=1 \
 	  ctest --output-on-failure -j$(JOBS) -LE integration
 
+test-tsan: tsan
+	bash tests/validate/tsan_validate.sh $(TSAN)
+
 test-fuzz: fuzz
 	bash fuzz/run_fuzzers.sh $(FUZZ) 30
 
 test: setup
 	$(MAKE) test-unit
 	$(MAKE) test-asan
+	$(MAKE) test-tsan
 	$(MAKE) test-fuzz
 
 install: linux

@@ -16,6 +16,14 @@ const char* const kFaulty = BRAKMORPH_TEST_FAULTY_PLUGIN;
 const char* const kFaulty = "";
 #endif
 
+// Sanitizer runtimes replace the allocator, so those builds of the host carry
+// no call counter and report the real-time checks as skipped.
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+constexpr bool kHostCounts = false;
+#else
+constexpr bool kHostCounts = true;
+#endif
+
 class ValidateCommand : public ::testing::Test {
  protected:
   void SetUp() override {
@@ -42,6 +50,7 @@ void expect_consistent_summary(const std::string& out) {
 }
 
 TEST_F(ValidateCommand, CountsAllocationsInTheAudioPath) {
+  if (!kHostCounts) GTEST_SKIP() << "sanitized host: no call counter";
   const auto careful = run({"validate", "--plugin", kFaulty, "--only", "realtime"});
   EXPECT_EQ(careful.status, 0) << careful.out << careful.err;
   EXPECT_NE(careful.out.find("PASS realtime.process_replacing: 0 allocations"), std::string::npos)
@@ -89,9 +98,13 @@ TEST_F(ValidateCommand, BrakmorphPassesAtFullStrictness) {
   const auto result = run({"validate", "--plugin", BRAKMORPH_TEST_PLUGIN, "--strictness", "10"});
   EXPECT_EQ(result.status, 0) << result.out << result.err;
   EXPECT_EQ(result.out.find("FAIL"), std::string::npos) << result.out;
-  EXPECT_EQ(result.out.find("SKIP"), std::string::npos) << result.out;
   expect_consistent_summary(result.out);
-  EXPECT_NE(result.out.find("PASS realtime.process_replacing"), std::string::npos);
+  if (kHostCounts) {
+    EXPECT_EQ(result.out.find("SKIP"), std::string::npos) << result.out;
+    EXPECT_NE(result.out.find("PASS realtime.process_replacing"), std::string::npos);
+  } else {
+    EXPECT_NE(result.out.find("SKIP realtime.process_replacing"), std::string::npos);
+  }
 }
 
 }  // namespace
