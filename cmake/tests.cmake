@@ -58,4 +58,17 @@ if(TARGET brakmorph)
                        PROPERTIES LABELS integration SKIP_RETURN_CODE 77)
   set_tests_properties(integration.wine_cross_build PROPERTIES TIMEOUT 900)
   set_tests_properties(integration.ardour_scan integration.lsp_bench PROPERTIES TIMEOUT 300)
+  # The validation battery: each Windows build under Wine (sharing the Wine
+  # prefix above, so the two never run at once), and the Linux host on a
+  # third-party plug-in, which must run to completion whatever it fails.
+  add_test(NAME integration.wine_validate
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/validate/wine_validate.sh
+                   --prefix ${INTEGRATION_WORK}/wine/prefix
+                   --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}")
+  add_test(NAME integration.lsp_validate
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/validate/lsp_validate.sh --cli $<TARGET_FILE:brakmorph>)
+  set_tests_properties(integration.wine_validate integration.lsp_validate
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600)
+  set_tests_properties(integration.wine_cross_build integration.wine_validate
+                       PROPERTIES RESOURCE_LOCK wine_prefix)
 endif()

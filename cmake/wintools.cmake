@@ -15,3 +15,22 @@ target_include_directories(win_render_host PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
 target_link_options(win_render_host PRIVATE -static -static-libgcc -static-libstdc++)
 set_target_properties(win_render_host PROPERTIES SUFFIX ".exe"
                       RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+
+# The validation battery on its own, so it runs against the DLLs under Wine.
+file(GLOB VALIDATE_SOURCES CONFIGURE_DEPENDS ${BRAKMORPH_WINTOOLS_ROOT}/cli/validate/*.cpp
+     ${BRAKMORPH_WINTOOLS_ROOT}/cli/validate/win32/*.cpp)
+add_executable(brakmorph_validate
+  ${VALIDATE_SOURCES}
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/validate/standalone/validate_main.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/command_validate.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/command_args.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/help_text.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/json_text.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/host_callback.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/hosted_plugin.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/win32/dynamic_module_win32.cpp)
+target_include_directories(brakmorph_validate PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
+                           ${BRAKMORPH_WINTOOLS_ROOT}/src)
+target_link_options(brakmorph_validate PRIVATE -static -static-libgcc -static-libstdc++)
+set_target_properties(brakmorph_validate PROPERTIES SUFFIX ".exe"
+                      RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
