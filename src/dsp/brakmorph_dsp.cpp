@@ -7,6 +7,8 @@
 
 #include "dsp/effect_params.h"
 #include "host/host_dsp_interface.h"
+#include "midi/midi_controller_key.h"
+#include "midi/midi_mgr.h"
 #include "params/param_reserved.h"
 #include "params/pin_group.h"
 #include "presets/program_slot.h"
@@ -78,7 +80,14 @@ void BrakmorphDsp::init() {
   for (int b = 0; b < kNbrBands; ++b) {
     bands_[b].init(this, b);
   }
-  // The MIDI manager's default control map joins here once the instance takes MIDI.
+  if (plugcore::MidiMgr* midi = host_dsp_ != nullptr ? host_dsp_->use_midi_mgr() : nullptr) {
+    midi->load_settings(get_property_str("plugin_name"));
+    midi->set_nbr_extra_controls(get_nbr_extra_controls());
+    midi->reset_map();
+    for (int j = 0; j < get_nbr_extra_controls(); ++j) {
+      midi->bind(kNbrParams + j, plugcore::kMidiKindNrpn, kNbrParams + j);
+    }
+  }
 }
 
 void BrakmorphDsp::set_default_state() {

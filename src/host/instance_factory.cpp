@@ -8,6 +8,7 @@
 #include "dsp/brakmorph_dsp.h"
 #include "host/host_dsp_vst2_win.h"
 #include "host/vst2_win_plugin.h"
+#include "midi/midi_settings.h"
 #include "presets/bank_file.h"
 
 namespace plugcore {
@@ -36,6 +37,7 @@ AEffect* create_instance(Vst2HostCallback host) {
   std::unique_ptr<HostDspVst2Win> host_dsp;
   Vst2WinPlugin* plugin = nullptr;
   try {
+    MidiSettings::set_default_nrpn_compatibility(0);
     dsp = std::make_unique<BrakmorphDsp>();
     host_dsp = std::make_unique<HostDspVst2Win>();
     const BankManager static_bank = load_static_bank();

@@ -4,11 +4,15 @@
 #include <cmath>
 #include <map>
 
+#include "config/setting_mgr.h"
 #include "config/system_services.h"
 #include "host/dsp_interface.h"
 #include "host/gui_interface.h"
 #include "host/host_dsp_interface.h"
 #include "host/rounding_mode_guard.h"
+#include "midi/midi_dev_sel_dispatcher.h"
+#include "midi/midi_mgr.h"
+#include "midi/vst2_midi_dev_sel_comp.h"
 #include "params/normalized_param_interface.h"
 #include "params/pin_group.h"
 
@@ -58,7 +62,14 @@ Vst2Plugin::Vst2Plugin(Vst2HostCallback host, DspInterface* dsp, GuiInterface* g
   if (dsp_->get_property_num("can_mono") != 0.0) {
     set_flag(effFlagsCanMono, true);
   }
-  // The MIDI manager and its ports join here once the instance takes MIDI.
+  if (midi_receiver_ != nullptr) {
+    midi_mgr_ = new MidiMgr;
+    host_midi_comp_ = new Vst2MidiDevSelComp(midi_mgr_);
+    midi_dispatcher_ = new MidiDevSelDispatcher(midi_mgr_);
+    midi_mgr_->init(midi_receiver_, dsp_, midi_dispatcher_, this);
+    midi_dispatcher_->add_component(host_midi_comp_);
+    host_midi_comp_->set_plugin(this);
+  }
   if (equal_ignoring_case(dsp_->get_property_str("plugin_category"), "instrument")) {
     set_flag(effFlagsIsSynth, true);
   }
@@ -67,6 +78,9 @@ Vst2Plugin::Vst2Plugin(Vst2HostCallback host, DspInterface* dsp, GuiInterface* g
 
 Vst2Plugin::~Vst2Plugin() {
   close_instance();
+  delete midi_dispatcher_;  // closes the devices it opened
+  delete host_midi_comp_;
+  delete midi_mgr_;
   delete dsp_;
   delete gui_;
 }
@@ -74,6 +88,9 @@ Vst2Plugin::~Vst2Plugin() {
 void Vst2Plugin::close_instance() {
   if (dsp_ != nullptr) {
     dsp_->close();
+  }
+  if (midi_mgr_ != nullptr) {
+    midi_mgr_->set_active(false);
   }
   if (gui_ != nullptr) {
     gui_->close();
@@ -84,6 +101,14 @@ void Vst2Plugin::init_instance() {
   dsp_->init();
   if (bank_.get_nbr_programs() > 0 && bank_.use_program(0).get_extra_size() > 0) {
     set_flag(effFlagsProgramChunks, true);
+  }
+  if (midi_mgr_ != nullptr) {
+    const int inputs_status = midi_dispatcher_->list_inputs();
+    const int outputs_status = midi_dispatcher_->list_outputs();
+    midi_mgr_->set_active(inputs_status == 0 && outputs_status == 0);
+    if (midi_dispatcher_->init_components() == 0) {
+      midi_dispatcher_->select_default(true);
+    }
   }
   if (gui_ != nullptr) {
     gui_->init();
@@ -134,7 +159,9 @@ bool Vst2Plugin::set_param_automated(int index, float norm, int priority) {
   if (!set_param(index, norm, priority)) {
     return false;
   }
-  // Controller feedback to the MIDI output joins here with the MIDI manager.
+  if (midi_mgr_ != nullptr) {
+    midi_mgr_->send_feedback(0, index, norm);
+  }
   call_host(audioMasterAutomate, index, 0, nullptr, norm);
   updateDisplay();
   return true;
@@ -156,6 +183,9 @@ void Vst2Plugin::apply_program(const ProgramSlot& program, int priority, bool re
     const float v = program.get_value(i);
     if (gui_ != nullptr) {
       gui_->notify_param_change(i, v, priority);
+    }
+    if (midi_mgr_ != nullptr) {
+      midi_mgr_->send_feedback(0, i, v);
     }
     if (automate) {
       call_host(audioMasterAutomate, i, 0, nullptr, v);
@@ -310,11 +340,17 @@ void Vst2Plugin::run_block(float** inputs, float** outputs, int32_t frames, bool
   }
   RoundingModeGuard rounding;
   forward_tempo();
-  // MIDI ports begin their block here once the instance takes MIDI.
+  if (midi_mgr_ != nullptr) {
+    midi_mgr_->begin_block();
+  }
   if (adding) {
     dsp_->process_adding(outputs, inputs, frames, 0);
   } else {
     dsp_->process_replacing(outputs, inputs, frames, 0);
+  }
+  if (midi_mgr_ != nullptr) {
+    midi_mgr_->set_time_stamp(0);
+    midi_mgr_->end_block();
   }
 }
 
@@ -325,8 +361,50 @@ void Vst2Plugin::processReplacing(float** inputs, float** outputs, int32_t frame
 }
 
 int32_t Vst2Plugin::processEvents(VstEvents* events) {
-  // Host MIDI reaches the MIDI manager here once the instance takes MIDI.
+  if (midi_mgr_ == nullptr || events == nullptr || !host_midi_comp_->use_input().is_open()) {
+    return 1;
+  }
+  for (int32_t i = 0; i < events->numEvents; ++i) {
+    const VstEvent* event = events->events[i];
+    if (event == nullptr || event->type != kVstMidiType) {
+      continue;
+    }
+    const auto* midi = reinterpret_cast<const VstMidiEvent*>(event);
+    const unsigned char bytes[3] = {static_cast<unsigned char>(midi->midiData[0]),
+                                    static_cast<unsigned char>(midi->midiData[1]),
+                                    static_cast<unsigned char>(midi->midiData[2])};
+    midi_mgr_->receive_host_event(bytes, midi->deltaFrames, midi->detune);
+  }
   return 1;
+}
+
+intptr_t Vst2Plugin::dispatcher(int32_t opcode, int32_t index, intptr_t value, void* ptr, float opt) {
+  if (opcode == effVendorSpecific && index == kSettingsVendorIndex && ptr != nullptr &&
+      (value == kSettingsLoadValue || value == kSettingsSaveValue)) {
+    const std::string path = static_cast<const char*>(ptr);
+    return (value == kSettingsLoadValue ? load_setting_file(path) : save_setting_file(path)) == 0 ? 1 : 0;
+  }
+  return AudioEffectX::dispatcher(opcode, index, value, ptr, opt);
+}
+
+int Vst2Plugin::load_setting_file(const std::string& path) {
+  if (midi_mgr_ == nullptr) {
+    return -1;
+  }
+  SettingMgr settings;
+  settings.init(*dsp_);
+  settings.add_client(midi_mgr_);
+  return settings.load_file(path);
+}
+
+int Vst2Plugin::save_setting_file(const std::string& path) {
+  if (midi_mgr_ == nullptr) {
+    return -1;
+  }
+  SettingMgr settings;
+  settings.init(*dsp_);
+  settings.add_client(midi_mgr_);
+  return settings.save_file(path);
 }
 
 // ---- Parameters --------------------------------------------------------------------

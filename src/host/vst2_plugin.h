@@ -14,8 +14,17 @@ namespace plugcore {
 
 class DspInterface;
 class GuiInterface;
+class MidiDevSelDispatcher;
 class MidiMgr;
 class MidiReceiverInterface;
+class Vst2MidiDevSelComp;
+
+// effVendorSpecific with index kSettingsVendorIndex and one of these values
+// loads (or saves) the instance's setting file named by ptr; it answers 1 on
+// success. Offline hosts use it to bring a control map along.
+constexpr int32_t kSettingsVendorIndex = 0x56626D78;  // 'Vbmx'
+constexpr intptr_t kSettingsLoadValue = 0x43666C64;   // 'Cfld'
+constexpr intptr_t kSettingsSaveValue = 0x43667376;   // 'Cfsv'
 
 // The VST 2 face of one instance: answers the host, arbitrates parameter writes,
 // keeps the host bank and routes audio blocks to the engine.
@@ -41,6 +50,7 @@ class Vst2Plugin : public AudioEffectX, public PluginCmdInterface {
   void apply_program(const ProgramSlot& program, int priority, bool release, bool automate) override;
 
   // AudioEffect / AudioEffectX.
+  intptr_t dispatcher(int32_t opcode, int32_t index, intptr_t value, void* ptr, float opt) override;
   void suspend() override;
   void resume() override;
   void setProgram(int32_t program) override;
@@ -74,6 +84,11 @@ class Vst2Plugin : public AudioEffectX, public PluginCmdInterface {
   // What the adapters ask of the core.
   int get_host_pin(bool output, int group, int pin) const;
   MidiMgr* use_midi_mgr() { return midi_mgr_; }
+  MidiDevSelDispatcher* use_midi_dispatcher() { return midi_dispatcher_; }
+  Vst2MidiDevSelComp* use_host_midi_comp() { return host_midi_comp_; }
+  // The setting file of the instance's MIDI settings: status of the setting manager.
+  int load_setting_file(const std::string& path);
+  int save_setting_file(const std::string& path);
   DspInterface* use_dsp() { return dsp_; }
   BankManager& use_bank() { return bank_; }
   int get_automation_threshold() const { return automation_threshold_; }
@@ -91,6 +106,8 @@ class Vst2Plugin : public AudioEffectX, public PluginCmdInterface {
   BankManager bank_;
   ParamPriorityList priorities_;
   MidiMgr* midi_mgr_ = nullptr;
+  MidiDevSelDispatcher* midi_dispatcher_ = nullptr;
+  Vst2MidiDevSelComp* host_midi_comp_ = nullptr;
   DspInterface* dsp_;
   GuiInterface* gui_;
   MidiReceiverInterface* midi_receiver_;

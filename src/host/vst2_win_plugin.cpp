@@ -1,14 +1,27 @@
 #include "host/vst2_win_plugin.h"
 
 #include "config/system_services.h"
+#include "midi/mci_midi_dev_sel_comp.h"
+#include "midi/midi_dev_sel_dispatcher.h"
+#include "midi/midi_port_driver_interface.h"
 
 namespace plugcore {
 
 Vst2WinPlugin::Vst2WinPlugin(Vst2HostCallback host, DspInterface* dsp, GuiInterface* gui,
                              MidiReceiverInterface* midi_receiver, const BankManager& static_bank, int32_t unique_id)
-    : Vst2Plugin(host, dsp, gui, midi_receiver, static_bank, unique_id) {}
+    : Vst2Plugin(host, dsp, gui, midi_receiver, static_bank, unique_id) {
+  if (midi_mgr_ != nullptr) {
+    system_midi_comp_ = new MciMidiDevSelComp(midi_mgr_, sys::make_system_midi_driver());
+    midi_dispatcher_->add_component(system_midi_comp_);
+  }
+}
 
-Vst2WinPlugin::~Vst2WinPlugin() = default;
+Vst2WinPlugin::~Vst2WinPlugin() {
+  if (midi_dispatcher_ != nullptr) {
+    midi_dispatcher_->close_all();  // no device of the component may stay in use
+  }
+  delete system_midi_comp_;
+}
 
 void Vst2WinPlugin::set_tempo(double bpm) {
   // The editor bridge takes the tempo over to the editor's thread once it exists.

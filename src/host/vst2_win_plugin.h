@@ -4,6 +4,8 @@
 
 namespace plugcore {
 
+class MciMidiDevSelComp;
+
 // The plug-in as the entry point builds it: adds the editor bridge and the system
 // MIDI ports to the portable core once those exist for the instance.
 class Vst2WinPlugin : public Vst2Plugin {
@@ -14,6 +16,10 @@ class Vst2WinPlugin : public Vst2Plugin {
 
   void set_tempo(double bpm) override;
   std::string get_base_directory() override;
+  MciMidiDevSelComp* use_system_midi_comp() { return system_midi_comp_; }
+
+ private:
+  MciMidiDevSelComp* system_midi_comp_ = nullptr;
 };
 
 }  // namespace plugcore

@@ -51,6 +51,19 @@ intptr_t VST2_CALL MockHost::callback(AEffect* effect, int32_t opcode, int32_t i
       return ptr != nullptr && std::strcmp(static_cast<const char*>(ptr), "sizeWindow") == 0 ? host->can_size_window
                                                                                               : 0;
     case audioMasterUpdateDisplay: host->update_display_calls++; return 1;
+    case audioMasterProcessEvents: {
+      host->process_events_calls++;
+      const auto* list = static_cast<const VstEvents*>(ptr);
+      for (int32_t i = 0; list != nullptr && i < list->numEvents; ++i) {
+        const VstEvent* event = list->events[i];
+        if (event == nullptr || event->type != kVstMidiType) continue;
+        const auto* midi = reinterpret_cast<const VstMidiEvent*>(event);
+        host->midi_out.push_back({static_cast<uint8_t>(midi->midiData[0]), static_cast<uint8_t>(midi->midiData[1]),
+                                  static_cast<uint8_t>(midi->midiData[2]), static_cast<uint8_t>(midi->midiData[3])});
+        host->midi_out_delta_frames.push_back(midi->deltaFrames);
+      }
+      return host->process_events_answer;
+    }
     default: return 0;
   }
 }

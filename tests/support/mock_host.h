@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <atomic>
 #include <cstdint>
 #include <string>
@@ -28,6 +29,11 @@ struct MockHost {
   std::atomic<int> update_display_calls{0};
   std::atomic<int> get_time_calls{0};
   std::atomic<int32_t> last_time_filter{-1};
+  // audioMasterProcessEvents: one call per list, the MIDI bytes of every event.
+  std::atomic<int> process_events_calls{0};
+  std::vector<std::array<uint8_t, 4>> midi_out;
+  std::vector<int32_t> midi_out_delta_frames;
+  intptr_t process_events_answer = 1;
 
   MockHost();
   ~MockHost();
