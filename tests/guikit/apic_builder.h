@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <cstring>
+#include <utility>
 #include <vector>
 
 namespace apic_test {
@@ -100,11 +101,13 @@ inline ApicBuilder unicolor_font(const std::vector<int32_t>& cell_widths, int32_
   for (int32_t w : cell_widths) width += w;
   b.width = width;
   b.height = glyph_height + 1;
-  b.pixels = coverage;
-  b.pixels.resize(static_cast<size_t>(width) * glyph_height, 0);
+  const size_t glyph_bytes = static_cast<size_t>(width) * static_cast<size_t>(glyph_height);
+  b.pixels.assign(glyph_bytes + static_cast<size_t>(width), 0);
+  for (size_t i = 0; i < coverage.size() && i < glyph_bytes; ++i) b.pixels[i] = coverage[i];
+  size_t x = glyph_bytes;
   uint8_t marker = 0;
   for (int32_t w : cell_widths) {
-    b.pixels.insert(b.pixels.end(), static_cast<size_t>(w), marker);
+    for (int32_t i = 0; i < w; ++i) b.pixels[x++] = marker;
     marker = static_cast<uint8_t>(255 - marker);
   }
   return b;
