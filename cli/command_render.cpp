@@ -7,6 +7,7 @@
 #include "cli/commands.h"
 #include "cli/demo_signal.h"
 #include "cli/hosted_plugin.h"
+#include "cli/midi_schedule.h"
 #include "cli/pending_output.h"
 #include "cli/platform_services.h"
 #include "cli/progress_bar.h"
@@ -30,6 +31,8 @@ struct RenderOptions {
   bool mono_in = false;
   bool mono_out = false;
   double tail_seconds = 0.0;
+  std::string midi_path;
+  std::string settings_path;
 };
 
 RenderOptions parse(basic::ArgReader& args) {
@@ -66,6 +69,10 @@ RenderOptions parse(basic::ArgReader& args) {
       options.mono_in = true;
     } else if (option == "--mono-out") {
       options.mono_out = true;
+    } else if (option == "--midi") {
+      options.midi_path = args.value(option);
+    } else if (option == "--settings") {
+      options.settings_path = args.value(option);
     } else if (option == "--tail") {
       options.tail_seconds = basic::parse_double(args.value(option), option, 0.0, 3600.0);
     } else {
@@ -110,12 +117,24 @@ int run_render(basic::ArgReader& args) {
   HostedPlugin plugin(options.plugin_path, rate, options.block, options.mono_in ? 1 : 2,
                       options.mono_out ? 1 : 2);
   apply_settings(plugin, options.settings);
+  if (!options.settings_path.empty()) {
+    load_plugin_settings(plugin, options.settings_path);
+  }
   RenderLoop loop(plugin, options.block, options.mode);
   std::vector<std::vector<float>> output;
   {
     basic::ProgressBar bar("rendering", sys::stderr_is_terminal());
     plugin.resume();
-    loop.run(left, right, frames, output, [&bar](double fraction) { bar.update(fraction); });
+    if (options.midi_path.empty()) {
+      loop.run(left, right, frames, output, [&bar](double fraction) { bar.update(fraction); });
+    } else {
+      MidiSchedule midi(basic::read_midi_file(options.midi_path), rate);
+      render_with_midi(loop, midi, plugin, left, right, frames, static_cast<size_t>(options.block), output,
+                       [&bar](double fraction) { bar.update(fraction); });
+      if (midi.remaining() > 0) {
+        std::cerr << "render: " << midi.remaining() << " MIDI events after the end of the signal were not sent\n";
+      }
+    }
     plugin.suspend();
   }
 

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "host/audio_effect_x.h"
+#include "midi/settings_vendor_call.h"
 #include "params/param_priority.h"
 #include "params/plugin_cmd_interface.h"
 #include "presets/bank_manager.h"
@@ -18,13 +19,6 @@ class MidiDevSelDispatcher;
 class MidiMgr;
 class MidiReceiverInterface;
 class Vst2MidiDevSelComp;
-
-// effVendorSpecific with index kSettingsVendorIndex and one of these values
-// loads (or saves) the instance's setting file named by ptr; it answers 1 on
-// success. Offline hosts use it to bring a control map along.
-constexpr int32_t kSettingsVendorIndex = 0x56626D78;  // 'Vbmx'
-constexpr intptr_t kSettingsLoadValue = 0x43666C64;   // 'Cfld'
-constexpr intptr_t kSettingsSaveValue = 0x43667376;   // 'Cfsv'
 
 // The VST 2 face of one instance: answers the host, arbitrates parameter writes,
 // keeps the host bank and routes audio blocks to the engine.
