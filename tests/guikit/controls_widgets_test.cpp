@@ -6,6 +6,7 @@
 #include "guikit/diode.h"
 #include "guikit/push_button.h"
 #include "guikit/text_box.h"
+#include "guikit/unicolor_font.h"
 
 using namespace guikit;
 using guikit_test::RecordingListener;
@@ -205,4 +206,51 @@ TEST(ControlsNeedle, TurnsAboutItsPivotAndPollsOnItsTimer) {
   EXPECT_GT(guikit_test::red_of(s.window.pixel(31, 30)), 200u);
   EXPECT_LT(guikit_test::red_of(s.window.pixel(40, 41)), 30u);
   EXPECT_LT(guikit_test::red_of(s.window.pixel(31, 50)), 30u);
+}
+
+namespace {
+
+// Glyphs 0..64 one column wide and empty; glyph 65 ('A') three columns, fully covered.
+struct TinyFont {
+  static constexpr int32_t kWidth = 68;
+  static constexpr int32_t kRows = 4;
+  std::vector<uint8_t> bytes;
+  std::unique_ptr<guikit::UnicolorFont> font;
+  TinyFont() : bytes(static_cast<size_t>(kWidth * (kRows + 1)), 0) {
+    for (int32_t y = 0; y < kRows; ++y)
+      for (int32_t x = 65; x < 68; ++x) bytes[static_cast<size_t>(y * kWidth + x)] = 255;
+    uint8_t* marker = &bytes[static_cast<size_t>(kRows * kWidth)];
+    for (int32_t x = 0; x < 65; ++x) marker[x] = (x % 2) ? 255 : 0;
+    for (int32_t x = 65; x < 68; ++x) marker[x] = 255;
+    font = std::make_unique<guikit::UnicolorFont>(guikit::Size{kWidth, kRows + 1}, bytes.data());
+  }
+};
+
+}  // namespace
+
+TEST(ControlsTextBox, DrawsItsTextInsideTheMarginsWithItsAlignment) {
+  Stage s(Size{40, 30});
+  TinyFont tiny;
+  ASSERT_EQ(66, tiny.font->get_glyph_count());
+  SolidPicture paper(20, 8, 0x00000000);
+  TextBox box;
+  box.set_background(paper.at(0, 0));
+  box.set_font(tiny.font.get());
+  box.set_text("A");
+  box.set_colour(0x00FF0000);
+  box.set_margins(Rect{2, 1, 0, 0});
+  s.add(box, Point{10, 10}, Rect{0, 0, 20, 8});
+  s.window.paint_all();
+  EXPECT_GT(guikit_test::red_of(s.window.pixel(12, 11)), 250u);
+  EXPECT_GT(guikit_test::red_of(s.window.pixel(14, 14)), 250u);
+  EXPECT_EQ(0u, s.window.pixel(12, 10)) << "the top margin";
+  EXPECT_EQ(0u, s.window.pixel(11, 12)) << "the left margin";
+  EXPECT_EQ(0u, s.window.pixel(15, 12));
+  EXPECT_EQ(0u, s.window.pixel(12, 15)) << "glyphs are four rows high";
+
+  box.set_alignment(kAlignCentre);
+  box.request_redraw();
+  s.window.paint_pending();
+  EXPECT_EQ(0u, s.window.pixel(12, 12));
+  EXPECT_GT(guikit_test::red_of(s.window.pixel(20, 12)), 250u) << "centred in the 18 pixels inside the margins";
 }
