@@ -35,10 +35,11 @@ asan:
 	cmake -S . -B $(ASAN) -DCMAKE_BUILD_TYPE=Debug -DBRAKMORPH_SANITIZE=address,undefined -DCMAKE_CXX_FLAGS=-O1
 	cmake --build $(ASAN) -j$(JOBS)
 
-# ThreadSanitizer: the host and the plug-ins only, for the threaded checks of validate.
+# ThreadSanitizer: the host and the plug-ins, for the threaded checks of
+# validate, and the MIDI thread tests.
 tsan:
 	cmake -S . -B $(TSAN) -DCMAKE_BUILD_TYPE=Debug -DBRAKMORPH_SANITIZE=thread -DCMAKE_CXX_FLAGS=-O1 -DBUILD_TESTING=OFF
-	cmake --build $(TSAN) -j$(JOBS) --target brakmorph Brakmorph ValidateFaulty
+	cmake --build $(TSAN) -j$(JOBS) --target brakmorph Brakmorph ValidateFaulty midi_thread_tests
 
 fuzz:
 	cmake -S fuzz -B $(FUZZ) -DCMAKE_CXX_COMPILER=clang++ -DCMAKE_C_COMPILER=clang
@@ -56,6 +57,7 @@ test-asan: asan
 
 test-tsan: tsan
 	bash tests/validate/tsan_validate.sh $(TSAN)
+	TSAN_OPTIONS=halt_on_error=1 $(TSAN)/midi_thread_tests --gtest_brief=1
 
 test-fuzz: fuzz
 	bash fuzz/run_fuzzers.sh $(FUZZ) 30

@@ -5,7 +5,8 @@ namespace basic {
 std::string quote_conf_text(const std::string& text) {
   bool quote = text.empty() || text.find("//") != std::string::npos;
   for (char c : text) {
-    if (c == ' ' || c == '\t' || c == '\n' || c == ',' || c == '=' || c == '{' || c == '}') {
+    if (c == ' ' || c == '\t' || c == '\n' || c == ',' || c == '=' || c == '{' || c == '}' || c == '\r' || c == '\b' ||
+        c == '\v') {
       quote = true;
     }
   }

@@ -46,8 +46,8 @@ class ConfKeyContentMulti : public ConfKeyContentInterface {
 };
 
 // Texts holding a space, tab, line feed or comma are written between double
-// quotes; so are empty texts and texts with '=', braces or "//", which would
-// not read back unchanged when bare. There is no escape character, so a text
+// quotes; so are empty texts and texts with '=', braces, "//" or the other
+// characters the reader splits at, which would not read back unchanged when bare. There is no escape character, so a text
 // holding a double quote cannot be written faithfully at all.
 std::string quote_conf_text(const std::string& text);
 

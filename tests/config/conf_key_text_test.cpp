@@ -96,7 +96,8 @@ TEST(ConfKeyText, ReadsTheExampleBackWithoutComments) {
 }
 
 TEST(ConfKeyText, QuotingKeepsAwkwardTextsIntact) {
-  for (const std::string text : {"a, b", "ab", "two words", "tab\there", "x=y", "{", "}", "a//b", "", "{ 1 2 }"}) {
+  for (const std::string text :
+       {"a, b", "ab", "two words", "tab\there", "x=y", "{", "}", "a//b", "", "{ 1 2 }", "cr\rlf", "v\vb\bx"}) {
     ConfKeyMulti root("r");
     root.add_key(ConfKeyData("v", text));
     ConfKeyFactory factory;
