@@ -250,8 +250,8 @@ TEST(MidiSystemPorts, ComponentListsOpensAndSends) {
   mgr.init(&receiver, nullptr, nullptr, &cmd);
   auto driver = std::make_unique<FakeDriver>();
   FakeDriver* fake = driver.get();
+  plugcore::MciMidiDevSelComp component(&mgr, std::move(driver));  // outlives the dispatcher that uses it
   plugcore::MidiDevSelDispatcher dispatcher(&mgr);
-  plugcore::MciMidiDevSelComp component(&mgr, std::move(driver));
   dispatcher.add_component(&component);
   ASSERT_EQ(dispatcher.list_inputs(), 0);
   ASSERT_EQ(dispatcher.list_outputs(), 0);
