@@ -203,6 +203,12 @@ void WindowCore::capture_changed() {
   }
 }
 
+void WindowCore::forget_capture() {
+  show_cursor_again();
+  capture_handler_ = nullptr;
+  capture_mode_ = 0;
+}
+
 void WindowCore::destroyed() { show_cursor_again(); }
 
 void WindowCore::paint(const Rect& dirty, RenderingBufferInterface& buffer, Size window_size) {

@@ -38,6 +38,8 @@ class WindowCore {
   void mouse_move(int32_t x, int32_t y);
   void mouse_button(int32_t x, int32_t y, uint32_t buttons, uint32_t modifiers, uint32_t double_click);
   void capture_changed();
+  // Drops the capture without telling its handler, which may already be gone.
+  void forget_capture();
   void paint(const Rect& dirty, RenderingBufferInterface& buffer, Size window_size);
   void destroyed();
   // Stops and forgets every timer of this window.

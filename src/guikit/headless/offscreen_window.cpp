@@ -36,6 +36,11 @@ OffscreenWindow::OffscreenWindow(Size editor_size, Size tile)
 }
 
 OffscreenWindow::~OffscreenWindow() {
+  // The controls may be destroyed before the window that showed them.
+  if (captured_) {
+    captured_ = false;
+    core_.forget_capture();
+  }
   close();
   install_clock(previous_clock_);
 }
