@@ -1,6 +1,7 @@
 #include "support/mock_host.h"
 
 #include <cstring>
+#include <mutex>
 
 namespace {
 MockHost* g_current = nullptr;
@@ -53,6 +54,8 @@ intptr_t VST2_CALL MockHost::callback(AEffect* effect, int32_t opcode, int32_t i
     case audioMasterUpdateDisplay: host->update_display_calls++; return 1;
     case audioMasterProcessEvents: {
       host->process_events_calls++;
+      // Instances may process on several threads at once.
+      std::lock_guard<std::mutex> lock(host->midi_out_mutex);
       const auto* list = static_cast<const VstEvents*>(ptr);
       for (int32_t i = 0; list != nullptr && i < list->numEvents; ++i) {
         const VstEvent* event = list->events[i];

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <atomic>
+#include <mutex>
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -31,6 +32,7 @@ struct MockHost {
   std::atomic<int32_t> last_time_filter{-1};
   // audioMasterProcessEvents: one call per list, the MIDI bytes of every event.
   std::atomic<int> process_events_calls{0};
+  std::mutex midi_out_mutex;
   std::vector<std::array<uint8_t, 4>> midi_out;
   std::vector<int32_t> midi_out_delta_frames;
   intptr_t process_events_answer = 1;

@@ -27,7 +27,9 @@ constexpr bool kHostCounts = true;
 class ValidateCommand : public ::testing::Test {
  protected:
   void SetUp() override {
-    work_ = ::testing::TempDir() + "validate_command";
+    // One folder per test: ctest runs these in parallel processes.
+    work_ = ::testing::TempDir() + "validate_command_" +
+            ::testing::UnitTest::GetInstance()->current_test_info()->name();
     std::filesystem::create_directories(work_);
   }
   cli_test::RunResult run(const std::vector<std::string>& args, const std::string& fault = "") {
