@@ -50,11 +50,11 @@ struct Glyph {
   std::vector<uint8_t> bitmap;
 };
 
-Picture render(FT_Library library, const FontSpec& spec) {
+Picture render(FT_Library library, const FontSpec& font) {
   FT_Face face = nullptr;
-  if (FT_New_Face(library, font_path(spec.face).c_str(), 0, &face) != 0 ||
-      FT_Set_Pixel_Sizes(face, 0, spec.pixel_size) != 0) {
-    throw std::runtime_error(std::string("make_skin: cannot size the font for ") + spec.name);
+  if (FT_New_Face(library, font_path(font.face).c_str(), 0, &face) != 0 ||
+      FT_Set_Pixel_Sizes(face, 0, font.pixel_size) != 0) {
+    throw std::runtime_error(std::string("make_skin: cannot size the font for ") + font.name);
   }
   const int baseline = static_cast<int>((face->size->metrics.ascender + 32) >> 6);
   std::vector<Glyph> glyphs(256);
@@ -67,7 +67,7 @@ Picture render(FT_Library library, const FontSpec& spec) {
       continue;
     }
     if (FT_Load_Char(face, cp, FT_LOAD_RENDER | FT_LOAD_TARGET_LIGHT) != 0) {
-      throw std::runtime_error(std::string("make_skin: glyph missing in ") + spec.name);
+      throw std::runtime_error(std::string("make_skin: glyph missing in ") + font.name);
     }
     const FT_GlyphSlot slot = face->glyph;
     Glyph& g = glyphs[byte];
@@ -88,9 +88,9 @@ Picture render(FT_Library library, const FontSpec& spec) {
     used += g.width;
   }
   FT_Done_Face(face);
-  const int slack = spec.total_width - used;
+  const int slack = font.total_width - used;
   if (slack < unused_cells) {
-    throw std::runtime_error(std::string("make_skin: glyphs too wide for ") + spec.name);
+    throw std::runtime_error(std::string("make_skin: glyphs too wide for ") + font.name);
   }
   int given = 0;
   for (int byte = 0; byte < 256; ++byte) {
@@ -100,18 +100,18 @@ Picture render(FT_Library library, const FontSpec& spec) {
     }
   }
   Picture p;
-  p.name = spec.name;
+  p.name = font.name;
   p.kind = kApicUnicolorFont;
   p.flag = kFlagOne;
-  p.image.width = spec.total_width;
-  p.image.height = spec.glyph_rows + 1;
+  p.image.width = font.total_width;
+  p.image.height = font.glyph_rows + 1;
   p.coverage.assign(static_cast<size_t>(p.image.width) * p.image.height, 0);
   int cell = 0;
   for (int byte = 0; byte < 256; ++byte) {
     const Glyph& g = glyphs[byte];
     for (int y = 0; y < g.rows; ++y) {
       const int row = baseline - g.top + y;
-      if (row < 0 || row >= spec.glyph_rows) {
+      if (row < 0 || row >= font.glyph_rows) {
         continue;
       }
       for (int x = 0; x < g.cols; ++x) {
@@ -126,7 +126,7 @@ Picture render(FT_Library library, const FontSpec& spec) {
     }
     const uint8_t marker = (byte % 2) ? 255 : 0;
     for (int x = 0; x < g.width; ++x) {
-      p.coverage[static_cast<size_t>(spec.glyph_rows) * p.image.width + cell + x] = marker;
+      p.coverage[static_cast<size_t>(font.glyph_rows) * p.image.width + cell + x] = marker;
     }
     cell += g.width;
   }
@@ -140,8 +140,8 @@ void add_fonts(std::vector<Picture>& out) {
   if (FT_Init_FreeType(&library) != 0) {
     throw std::runtime_error("make_skin: cannot start FreeType");
   }
-  for (const FontSpec& spec : kSpecs) {
-    out.push_back(render(library, spec));
+  for (const FontSpec& font : kSpecs) {
+    out.push_back(render(library, font));
   }
   FT_Done_FreeType(library);
 }

@@ -82,14 +82,14 @@ void paint_knob(cairo_t* cr, double cx, double cy, double skirt, double cap, dou
     circle(cr, cx, cy, r);
     cairo_stroke(cr);
   }
-  cairo_pattern_t* spec = cairo_pattern_create_radial(cx - cap * 0.35, cy - cap * 0.45, 0, cx - cap * 0.35,
+  cairo_pattern_t* highlight = cairo_pattern_create_radial(cx - cap * 0.35, cy - cap * 0.45, 0, cx - cap * 0.35,
                                                       cy - cap * 0.45, cap * 0.95);
-  cairo_pattern_add_color_stop_rgba(spec, 0, 1, 1, 1, 0.26);
-  cairo_pattern_add_color_stop_rgba(spec, 1, 1, 1, 1, 0);
-  cairo_set_source(cr, spec);
+  cairo_pattern_add_color_stop_rgba(highlight, 0, 1, 1, 1, 0.26);
+  cairo_pattern_add_color_stop_rgba(highlight, 1, 1, 1, 1, 0);
+  cairo_set_source(cr, highlight);
   circle(cr, cx, cy, cap);
   cairo_fill(cr);
-  cairo_pattern_destroy(spec);
+  cairo_pattern_destroy(highlight);
   cairo_set_line_width(cr, 0.7);
   linear_fill(cr, cx - cap, cy - cap, cx + cap, cy + cap, hex(0xA0A8B2), hex(0x101215), 0.9);
   circle(cr, cx, cy, cap - 0.35);
@@ -223,13 +223,13 @@ void paint_lamp(cairo_t* cr, double cx, double cy, double level, const Rgb& lit)
   circle(cr, cx, cy, 5.6);
   cairo_fill(cr);
   cairo_pattern_destroy(lens);
-  cairo_pattern_t* spec = cairo_pattern_create_radial(cx - 2, cy - 2.4, 0, cx - 2, cy - 2.4, 3.0);
-  cairo_pattern_add_color_stop_rgba(spec, 0, 1, 1, 1, 0.55);
-  cairo_pattern_add_color_stop_rgba(spec, 1, 1, 1, 1, 0);
-  cairo_set_source(cr, spec);
+  cairo_pattern_t* highlight = cairo_pattern_create_radial(cx - 2, cy - 2.4, 0, cx - 2, cy - 2.4, 3.0);
+  cairo_pattern_add_color_stop_rgba(highlight, 0, 1, 1, 1, 0.55);
+  cairo_pattern_add_color_stop_rgba(highlight, 1, 1, 1, 1, 0);
+  cairo_set_source(cr, highlight);
   circle(cr, cx, cy, 5.6);
   cairo_fill(cr);
-  cairo_pattern_destroy(spec);
+  cairo_pattern_destroy(highlight);
 }
 
 void add_switches(std::vector<Picture>& out) {
