@@ -42,6 +42,7 @@ const HelpEntry kHelp[] = {
      "                        [--program N] [--set NAME=TEXT]... [--norm INDEX=VALUE]...\n"
      "                        [--rate HZ] [--block N] [--mode replacing|adding]\n"
      "                        [--mono-in] [--mono-out] [--tail SECONDS]\n"
+     "                        [--midi FILE.mid] [--settings FILE.cfg.txt]\n"
      "\n"
      "Processes IN (any format the audio file library reads; a mono file feeds both\n"
      "inputs, beyond two channels the first two are used) or, without an input, the\n"
@@ -57,6 +58,9 @@ const HelpEntry kHelp[] = {
      "  --mono-out          use only the first output: a one-channel file\n"
      "  --tail SECONDS      append that much silence to the input\n"
      "  --raw-in/--raw-out  headerless interleaved stereo float32 little-endian audio\n"
+     "  --midi FILE.mid     send the file's channel messages (CC, RPN, NRPN...) to the\n"
+     "                      plug-in at their sample offsets (formats 0 and 1, tempo map)\n"
+     "  --settings FILE     load a setting file (the MIDI control map) before rendering\n"
      "The output is written next to OUT under a temporary name and renamed when\n"
      "complete. The last line gives the output's peak and RMS level in dBFS.\n"},
     {"demo",
