@@ -69,6 +69,12 @@ if(TARGET brakmorph)
            COMMAND bash ${CMAKE_SOURCE_DIR}/tests/validate/lsp_validate.sh --cli $<TARGET_FILE:brakmorph>)
   set_tests_properties(integration.wine_validate integration.lsp_validate
                        PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600)
-  set_tests_properties(integration.wine_cross_build integration.wine_validate
+  add_test(NAME integration.wine_registry
+           COMMAND bash ${INTEGRATION_DIR}/wine_registry.sh
+                   --prefix ${INTEGRATION_WORK}/wine/prefix
+                   --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}")
+  set_tests_properties(integration.wine_registry
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600)
+  set_tests_properties(integration.wine_cross_build integration.wine_validate integration.wine_registry
                        PROPERTIES RESOURCE_LOCK wine_prefix)
 endif()

@@ -34,3 +34,10 @@ target_include_directories(brakmorph_validate PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
 target_link_options(brakmorph_validate PRIVATE -static -static-libgcc -static-libstdc++)
 set_target_properties(brakmorph_validate PROPERTIES SUFFIX ".exe"
                       RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+
+# The per-user value store against the real registry, for a script under Wine.
+add_executable(registry_probe ${BRAKMORPH_WINTOOLS_ROOT}/tests/windows/registry_probe.cpp)
+target_link_libraries(registry_probe PRIVATE brakmorph_core)
+target_link_options(registry_probe PRIVATE -static -static-libgcc -static-libstdc++)
+set_target_properties(registry_probe PROPERTIES SUFFIX ".exe"
+                      RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
