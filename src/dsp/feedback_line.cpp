@@ -7,12 +7,12 @@
 #include "dsp/brakmorph_dsp.h"
 #include "dsp/effect_params.h"
 #include "dsp/ring_cursor.h"
+#include "params/param_round.h"
 
 namespace {
 
 constexpr int kMaxChunk = 256;
 
-int round_half_up(double x) { return static_cast<int>(std::floor(x + 0.5)); }
 
 }  // namespace
 
@@ -58,7 +58,7 @@ void FeedbackLine::prepare() {
   feedback_gain_ = static_cast<float>((std::pow(16.0, static_cast<double>(amount_)) - 1.0) / 15.0);
   coefficients_changed_ = true;
   period_ = static_cast<float>(1.0 / pitch_param_->get_value());
-  feedback_delay_ = round_half_up(static_cast<double>(period_) * sample_rate_);
+  feedback_delay_ = plugcore::round_half_up_int(static_cast<double>(period_) * sample_rate_);
   recompute_longest_chunk();
 }
 
@@ -74,7 +74,7 @@ void FeedbackLine::set_sample_rate(float rate) {
   sample_rate_ = rate;
   input_detector_.set_sample_rate(rate);
   feedback_detector_.set_sample_rate(rate);
-  const int needed = round_half_up(rate / 16.0) + kMaxChunk;
+  const int needed = plugcore::round_half_up_int(rate / 16.0) + kMaxChunk;
   if (needed > buffer_length_) {
     int length = 1;
     while (length < needed) {
@@ -84,8 +84,8 @@ void FeedbackLine::set_sample_rate(float rate) {
     buffer_.resize(static_cast<size_t>(length), 0.0f);
     mask_ = length - 1;
   }
-  feedback_delay_ = round_half_up(static_cast<double>(period_) * rate);
-  stereo_delay_samples_ = round_half_up(static_cast<double>(stereo_delay_) * rate);
+  feedback_delay_ = plugcore::round_half_up_int(static_cast<double>(period_) * rate);
+  stereo_delay_samples_ = plugcore::round_half_up_int(static_cast<double>(stereo_delay_) * rate);
   high_pass_.set_sample_rate(rate);
   high_pass_.set_high_pass();
   coefficients_changed_ = true;
@@ -99,7 +99,7 @@ void FeedbackLine::set_master_volume(float v) {
 
 void FeedbackLine::set_stereo_delay(float seconds) {
   stereo_delay_ = seconds;
-  stereo_delay_samples_ = round_half_up(static_cast<double>(seconds) * sample_rate_);
+  stereo_delay_samples_ = plugcore::round_half_up_int(static_cast<double>(seconds) * sample_rate_);
 }
 
 void FeedbackLine::reset() { clear_state(); }

@@ -8,11 +8,10 @@
 #include "dsp/distortion_curves.h"
 #include "dsp/effect_params.h"
 #include "dsp/fast_math.h"
+#include "params/param_round.h"
 #include "params/param_reserved.h"
 
 namespace {
-
-int round_half_up(double x) { return static_cast<int>(std::floor(x + 0.5)); }
 
 template <class Param>
 plugcore::NormalizedParamInterface* add_band_param(BrakmorphDsp* engine, FreqBand* band, int number,
@@ -76,9 +75,9 @@ void FreqBand::recompute() {
   character_ = static_cast<float>(character_param_->get_value());
   intensity_ = static_cast<float>(intensity_param_->get_value());
   disto_amount_ = static_cast<float>(amount_param_->get_value());
-  curve_index_ = std::min(std::max(round_half_up(type_param_->get_value()), 0), kCurveCount - 1);
+  curve_index_ = std::min(std::max(plugcore::round_half_up_int(type_param_->get_value()), 0), kCurveCount - 1);
   band_volume_ = static_cast<float>(volume_param_->get_value());
-  soloed_.store(round_half_up(solo_param_->get_value()) == 1, std::memory_order_relaxed);
+  soloed_.store(plugcore::round_half_up_int(solo_param_->get_value()) == 1, std::memory_order_relaxed);
   if (engine_ != nullptr) {
     engine_->recompute_band_enabled();
   }

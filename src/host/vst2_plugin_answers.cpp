@@ -9,6 +9,7 @@
 #include "host/dsp_interface.h"
 #include "host/vst2_plugin.h"
 #include "params/normalized_param_interface.h"
+#include "params/param_round.h"
 #include "params/pin_group.h"
 #include "params/text_copy.h"
 
@@ -28,9 +29,6 @@ std::string lower(std::string text) {
   }
   return text;
 }
-
-// Nearest integer with halves upward, as the host's integer ranges need.
-int round_half_up(double x) { return static_cast<int>(std::floor(x + 0.5)); }
 
 bool fill_pin(DspInterface& dsp, bool output, int32_t index, VstPinProperties* properties) {
   int host_pin = 0;
@@ -170,7 +168,7 @@ bool Vst2Plugin::getProductString(char* text) {
 
 int32_t Vst2Plugin::getVendorVersion() {
   const double version = dsp_->get_property_num("plugin_version");
-  const int hundredths = round_half_up(version * 100.0);
+  const int hundredths = plugcore::round_half_up_int(version * 100.0);
   const int major = hundredths / 100;
   const int d1 = (hundredths / 10) % 10;
   const int d2 = hundredths % 10;
@@ -200,8 +198,8 @@ bool Vst2Plugin::getParameterProperties(int32_t index, VstParameterProperties* p
   param.get_name(p->label, 64);
   copy_text(p->shortLabel, p->label, kShortLabelCapacity);
   if (param.get_type() == 1) {
-    int lo = round_half_up(param.conv_norm_to_value(0.0f));
-    int hi = round_half_up(param.conv_norm_to_value(1.0f));
+    int lo = plugcore::round_half_up_int(param.conv_norm_to_value(0.0f));
+    int hi = plugcore::round_half_up_int(param.conv_norm_to_value(1.0f));
     if (hi < lo) {
       std::swap(lo, hi);
     }
