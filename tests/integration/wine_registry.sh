@@ -18,37 +18,16 @@ while [ $# -gt 0 ]; do
   esac
 done
 [ -n "$prefix" ] || { echo "usage: see the head of $0" >&2; exit 2; }
-
-unavailable() {
-  echo "SKIP: $1"
-  if [ "${BRAKMORPH_REQUIRE_WINDOWS:-0}" = 1 ]; then
-    echo "FAIL: BRAKMORPH_REQUIRE_WINDOWS=1 and $1" >&2
-    exit 1
-  fi
-  exit 77
-}
+. "$(dirname "$0")/wine_prefix.sh"
 
 IFS=':' read -r -a build_dirs <<< "$windows_builds"
-[ ${#build_dirs[@]} -gt 0 ] || unavailable "no Windows build folders configured"
+[ ${#build_dirs[@]} -gt 0 ] || windows_unavailable "no Windows build folders configured"
 for dir in "${build_dirs[@]}"; do
-  [ -f "$dir/bin/registry_probe.exe" ] || unavailable "$dir/bin/registry_probe.exe missing (make win32 win64)"
+  [ -f "$dir/bin/registry_probe.exe" ] || windows_unavailable "$dir/bin/registry_probe.exe missing (make win32 win64)"
 done
-command -v wine > /dev/null || unavailable "wine not installed"
+command -v wine > /dev/null || windows_unavailable "wine not installed"
 
-mkdir -p "$(dirname "$prefix")"
-export WINEPREFIX=$(cd "$(dirname "$prefix")" && pwd)/$(basename "$prefix")
-export WINEDEBUG=-all
-export WINEDLLOVERRIDES="mscoree,mshtml="
-export WINEARCH=win64
-unset DISPLAY WAYLAND_DISPLAY
-trap 'wineserver -k > /dev/null 2>&1 || true' EXIT
-if [ ! -f "$WINEPREFIX/.prefix-ready" ]; then
-  rm -rf "$WINEPREFIX"
-  echo "setting up the Wine prefix $WINEPREFIX (first run only)"
-  timeout 600 wineboot -i > /dev/null 2>&1 || { echo "FAIL: wineboot -i failed" >&2; exit 1; }
-  timeout 120 wineserver -w || true
-  touch "$WINEPREFIX/.prefix-ready"
-fi
+wine_prefix_ready "$prefix"
 
 failures=0
 check() {  # check DESCRIPTION EXPECTED ACTUAL
