@@ -177,15 +177,19 @@ void BrakmorphDsp::store_program(plugcore::ProgramSlot& program) {
 
 void BrakmorphDsp::recompute_band_enabled() {
   const int count = splitter_.get_band_count();
+  std::array<bool, kNbrBands> enabled{};
   bool any = false;
   for (int b = 0; b < kNbrBands; ++b) {
-    band_enabled_[b] = bands_[b].is_soloed();
-    if (b < count && band_enabled_[b]) {
+    enabled[b] = bands_[b].is_soloed();
+    if (b < count && enabled[b]) {
       any = true;
     }
   }
   if (!any) {
-    band_enabled_.fill(true);
+    enabled.fill(true);
+  }
+  for (int b = 0; b < kNbrBands; ++b) {
+    band_enabled_[b].store(enabled[b], std::memory_order_relaxed);
   }
 }
 
@@ -204,7 +208,7 @@ bool BrakmorphDsp::read_clip() {
 }
 
 float BrakmorphDsp::get_band_level(int band) const {
-  if (band < 0 || band >= kNbrBands || !band_enabled_[band]) {
+  if (band < 0 || band >= kNbrBands || !band_enabled_[band].load(std::memory_order_relaxed)) {
     return 0.0f;
   }
   return bands_[band].get_level();
@@ -312,7 +316,7 @@ int BrakmorphDsp::process_block(float** outputs, float** inputs, int frames, boo
     const int count = oversampling_on_ ? 4 * n : n;
     const int band_count = splitter_.get_band_count();
     for (int b = 0; b < band_count; ++b) {
-      if (band_enabled_[b]) {
+      if (band_enabled_[b].load(std::memory_order_relaxed)) {
         bands_[b].process(bands[b], n, metering);
       } else {
         std::fill(bands[b], bands[b] + count, 0.0f);

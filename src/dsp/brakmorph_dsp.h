@@ -75,7 +75,7 @@ class BrakmorphDsp : public plugcore::DspInterface,
 
   // Views for tests.
   int get_band_count() const { return splitter_.get_band_count(); }
-  bool is_band_enabled(int band) const { return band_enabled_[band]; }
+  bool is_band_enabled(int band) const { return band_enabled_[band].load(std::memory_order_relaxed); }
   const FreqBand& get_band(int band) const { return bands_[band]; }
   const FeedbackLine& get_feedback_line() const { return feedback_; }
   bool is_tone_active() const { return tone_.is_active(); }
@@ -113,7 +113,8 @@ class BrakmorphDsp : public plugcore::DspInterface,
   bool oversampling_on_ = false;
   bool stereo_boost_on_ = false;
   float stereo_delay_ = 0.0f;
-  std::array<bool, kNbrBands> band_enabled_{{true, true, true, true}};
+  // Read by the editor's meters while blocks run.
+  std::array<std::atomic<bool>, kNbrBands> band_enabled_{{true, true, true, true}};
   plugcore::NormalizedParamInterface* oversampling_param_ = nullptr;
   plugcore::NormalizedParamInterface* stereo_boost_param_ = nullptr;
   plugcore::NormalizedParamInterface* tone_freq_param_ = nullptr;
