@@ -31,14 +31,7 @@ for required in "$cli" "$tool" "$plugin" "$work"; do
   [ -n "$required" ] || { echo "usage: see the head of $0" >&2; exit 2; }
 done
 
-unavailable() {
-  echo "SKIP: $1"
-  if [ "${BRAKMORPH_REQUIRE_WINDOWS:-0}" = 1 ]; then
-    echo "FAIL: BRAKMORPH_REQUIRE_WINDOWS=1 and $1" >&2
-    exit 1
-  fi
-  exit 77
-}
+. "$(dirname "$0")/wine_prefix.sh"
 
 failures=0
 fail() {
@@ -49,18 +42,18 @@ fail() {
 # The Windows builds named by the Linux configuration.
 dlls=() hosts=() arches=()
 IFS=':' read -r -a build_dirs <<< "$windows_builds"
-[ ${#build_dirs[@]} -gt 0 ] || unavailable "no Windows build folders configured (BRAKMORPH_WINDOWS_BUILDS)"
+[ ${#build_dirs[@]} -gt 0 ] || windows_unavailable "no Windows build folders configured (BRAKMORPH_WINDOWS_BUILDS)"
 for dir in "${build_dirs[@]}"; do
   dll="$dir/vst/Brakmorph.dll"
   host="$dir/bin/win_render_host.exe"
-  [ -f "$dll" ] || unavailable "$dll missing (make win32 win64)"
-  [ -f "$host" ] || unavailable "$host missing (make win32 win64)"
+  [ -f "$dll" ] || windows_unavailable "$dll missing (make win32 win64)"
+  [ -f "$host" ] || windows_unavailable "$host missing (make win32 win64)"
   dlls+=("$dll")
   hosts+=("$host")
 done
-command -v wine > /dev/null || unavailable "wine not installed"
-command -v x86_64-w64-mingw32-objdump > /dev/null || unavailable "mingw-w64 binutils not installed"
-command -v x86_64-w64-mingw32-windres > /dev/null || unavailable "mingw-w64 windres not installed"
+command -v wine > /dev/null || windows_unavailable "wine not installed"
+command -v x86_64-w64-mingw32-objdump > /dev/null || windows_unavailable "mingw-w64 binutils not installed"
+command -v x86_64-w64-mingw32-windres > /dev/null || windows_unavailable "mingw-w64 windres not installed"
 
 mkdir -p "$work"
 work=$(cd "$work" && pwd)
@@ -141,22 +134,7 @@ fi
 # ---------------------------------------------------------------------------
 # Wine: a private prefix under the build folder, set up once.
 
-export WINEPREFIX="$work/prefix"
-export WINEDEBUG=-all
-export WINEDLLOVERRIDES="mscoree,mshtml="  # no Mono or Gecko installer prompts
-export WINEARCH=win64                        # runs both 32- and 64-bit programs
-unset DISPLAY WAYLAND_DISPLAY
-trap 'wineserver -k > /dev/null 2>&1 || true' EXIT
-
-if [ ! -f "$WINEPREFIX/.prefix-ready" ]; then
-  rm -rf "$WINEPREFIX"
-  echo "setting up the Wine prefix $WINEPREFIX (first run only)"
-  started=$(date +%s)
-  timeout 600 wineboot -i > "$work/wineboot.log" 2>&1 || { cat "$work/wineboot.log"; fail "wineboot -i failed"; exit 1; }
-  timeout 120 wineserver -w || true
-  touch "$WINEPREFIX/.prefix-ready"
-  echo "prefix ready in $(( $(date +%s) - started )) s"
-fi
+wine_prefix_ready "$work/prefix"
 
 # Wine maps the Unix root to drive Z:.
 windows_path() {
