@@ -17,6 +17,13 @@ class WindowInterface : public MessageHandlerInterface {
   virtual void resize() = 0;
   virtual void set_roots(MessageHandlerInterface* background, MessageHandlerInterface* controls) = 0;
   virtual void set_editor_size(Size size) = 0;
+  // The size the window takes when it may not follow the editor's size.
+  virtual void set_window_size(Size size) = 0;
+  // true: the window opens at the editor size; false: at the window size.
+  virtual void set_can_resize(bool can_resize) = 0;
+  // Called from the host's idle on the user-interface thread: windows whose
+  // events and timers are not delivered by the system do their work here.
+  virtual void idle() = 0;
 };
 
 }  // namespace guikit

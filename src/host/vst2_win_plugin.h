@@ -5,6 +5,7 @@
 namespace plugcore {
 
 class MciMidiDevSelComp;
+class Vst2WinEditor;
 
 // The plug-in as the entry point builds it: adds the editor bridge and the system
 // MIDI ports to the portable core once those exist for the instance.
@@ -17,8 +18,10 @@ class Vst2WinPlugin : public Vst2Plugin {
   void set_tempo(double bpm) override;
   std::string get_base_directory() override;
   MciMidiDevSelComp* use_system_midi_comp() { return system_midi_comp_; }
+  Vst2WinEditor* use_editor_bridge() { return editor_bridge_; }
 
  private:
+  Vst2WinEditor* editor_bridge_ = nullptr;  // also the AudioEffect's editor
   MciMidiDevSelComp* system_midi_comp_ = nullptr;
 };
 

@@ -47,6 +47,7 @@ OffscreenWindow::~OffscreenWindow() {
 
 int32_t OffscreenWindow::open(void*) {
   open_ = true;
+  open_size_ = can_resize_ ? core_.get_editor_size() : window_size_;
   return 0;
 }
 

@@ -31,7 +31,12 @@ class OffscreenWindow : public WindowInterface, private WindowPlatformInterface 
   void resize() override {}
   void set_roots(MessageHandlerInterface* background, MessageHandlerInterface* controls) override;
   void set_editor_size(Size size) override;
-  void set_window_size(Size size) { window_size_ = size; }
+  void set_window_size(Size size) override { window_size_ = size; }
+  void set_can_resize(bool can_resize) override { can_resize_ = can_resize; }
+  void idle() override {}
+  // The size the window took when it was last opened.
+  Size get_open_size() const { return open_size_; }
+  bool is_open() const { return open_; }
 
   // Synthetic mouse events, positions in window pixels.
   void mouse_move(int32_t x, int32_t y);
@@ -113,6 +118,8 @@ class OffscreenWindow : public WindowInterface, private WindowPlatformInterface 
   TileBuffer tile_buffer_;
   std::vector<uint32_t> screen_;
   bool open_ = true;
+  bool can_resize_ = false;
+  Size open_size_;
   Point cursor_;
   int cursor_hide_count_ = 0;
   bool captured_ = false;

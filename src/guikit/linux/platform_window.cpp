@@ -1,0 +1,7 @@
+#include "guikit/platform_window.h"
+
+namespace guikit {
+
+std::unique_ptr<WindowInterface> create_platform_window(Size) { return nullptr; }
+
+}  // namespace guikit
