@@ -2,6 +2,6 @@
 
 namespace guikit {
 
-std::unique_ptr<WindowInterface> create_platform_window(Size) { return nullptr; }
+std::unique_ptr<WindowInterface> create_system_window(Size) { return nullptr; }
 
 }  // namespace guikit
