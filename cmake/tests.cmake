@@ -3,7 +3,7 @@ find_package(GTest REQUIRED)
 include(GoogleTest)
 
 file(GLOB_RECURSE TEST_SOURCES CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/tests/*.cpp)
-list(FILTER TEST_SOURCES EXCLUDE REGEX "/tests/(support|windows|realtime|integration|cli/fake_plugin)/")
+list(FILTER TEST_SOURCES EXCLUDE REGEX "/tests/(support|windows|realtime|integration|ardour|cli/fake_plugin)/")
 file(GLOB TEST_SUPPORT_SOURCES CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/tests/support/*.cpp)
 
 add_executable(brakmorph_tests ${TEST_SOURCES} ${TEST_SUPPORT_SOURCES})
@@ -75,6 +75,27 @@ if(TARGET brakmorph)
                    --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}")
   set_tests_properties(integration.wine_registry
                        PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600)
+  # A real host end to end: record, export, save, reload and export again in
+  # the host's headless session runner, compared with the command-line render.
+  add_executable(ardour_wav_tool ${CMAKE_SOURCE_DIR}/tests/ardour/wav_tool.cpp)
+  target_link_libraries(ardour_wav_tool PRIVATE ${BRAKMORPH_SNDFILE_LIB})
+  add_test(NAME integration.ardour_session
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/ardour/run_session_route.sh
+                   --cli $<TARGET_FILE:brakmorph> --plugin $<TARGET_FILE:Brakmorph>
+                   --tool $<TARGET_FILE:ardour_wav_tool> --work ${INTEGRATION_WORK}/ardour_session)
+  set_tests_properties(integration.ardour_session
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 240)
   set_tests_properties(integration.wine_cross_build integration.wine_validate integration.wine_registry
                        PROPERTIES RESOURCE_LOCK wine_prefix)
+endif()
+
+# The editor window on a real X server: a virtual one, started for the run.
+# XTest drives the pointer and keys; the screenshots are written as PNG.
+target_link_libraries(brakmorph_tests PRIVATE Xtst png)
+find_program(XVFB_RUN xvfb-run)
+if(XVFB_RUN)
+  add_test(NAME x11_window
+           COMMAND ${XVFB_RUN} -a -s "-screen 0 1024x768x24" $<TARGET_FILE:brakmorph_tests> --gtest_filter=X11*)
+  set_tests_properties(x11_window PROPERTIES LABELS window TIMEOUT 120
+                       ENVIRONMENT "BRAKMORPH_SCREENSHOT_DIR=${CMAKE_BINARY_DIR}/screenshots;BRAKMORPH_NO_DESKTOP_TOOLS=1")
 endif()
