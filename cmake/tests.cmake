@@ -85,8 +85,15 @@ if(TARGET brakmorph)
                    --tool $<TARGET_FILE:ardour_wav_tool> --work ${INTEGRATION_WORK}/ardour_session)
   set_tests_properties(integration.ardour_session
                        PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 240)
+  # The editor window of each Windows build on a private X server.
+  add_test(NAME integration.wine_window
+           COMMAND bash ${INTEGRATION_DIR}/wine_window.sh
+                   --prefix ${INTEGRATION_WORK}/wine/prefix
+                   --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}")
+  set_tests_properties(integration.wine_window
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600)
   set_tests_properties(integration.wine_cross_build integration.wine_validate integration.wine_registry
-                       PROPERTIES RESOURCE_LOCK wine_prefix)
+                       integration.wine_window PROPERTIES RESOURCE_LOCK wine_prefix)
 endif()
 
 # The editor window on a real X server: a virtual one, started for the run.

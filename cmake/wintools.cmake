@@ -41,3 +41,15 @@ target_link_libraries(registry_probe PRIVATE brakmorph_core)
 target_link_options(registry_probe PRIVATE -static -static-libgcc -static-libstdc++)
 set_target_properties(registry_probe PROPERTIES SUFFIX ".exe"
                       RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+
+# The editor window on the desktop (run under Wine with an X server by a
+# script): the skin scene in a real window against its off-screen rendering.
+add_executable(win_window_test
+  ${BRAKMORPH_WINTOOLS_ROOT}/tests/windows/win_window_test.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/tests/support/skin_test_scene.cpp
+  ${BRAKMORPH_RC_FILE})
+target_include_directories(win_window_test PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}/tests ${BRAKMORPH_WINTOOLS_ROOT}/src)
+target_link_libraries(win_window_test PRIVATE brakmorph_core)
+target_link_options(win_window_test PRIVATE -static -static-libgcc -static-libstdc++)
+set_target_properties(win_window_test PROPERTIES SUFFIX ".exe"
+                      RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
