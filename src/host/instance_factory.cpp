@@ -6,7 +6,9 @@
 
 #include "config/system_services.h"
 #include "dsp/brakmorph_dsp.h"
+#include "editor/brakmorph_gui.h"
 #include "host/host_dsp_vst2_win.h"
+#include "host/host_gui_vst2_win.h"
 #include "host/vst2_win_plugin.h"
 #include "midi/midi_settings.h"
 #include "presets/bank_file.h"
@@ -35,19 +37,28 @@ AEffect* create_instance(Vst2HostCallback host) {
   }
   std::unique_ptr<BrakmorphDsp> dsp;
   std::unique_ptr<HostDspVst2Win> host_dsp;
+  std::unique_ptr<BrakmorphGui> gui;
+  std::unique_ptr<HostGuiVst2Win> host_gui;
   Vst2WinPlugin* plugin = nullptr;
   try {
     MidiSettings::set_default_nrpn_compatibility(0);
     dsp = std::make_unique<BrakmorphDsp>();
     host_dsp = std::make_unique<HostDspVst2Win>();
+    gui = std::make_unique<BrakmorphGui>();
+    host_gui = std::make_unique<HostGuiVst2Win>();
     const BankManager static_bank = load_static_bank();
 
     MidiReceiverInterface* receiver = dsp.get();
-    plugin = new Vst2WinPlugin(host, dsp.get(), nullptr, receiver, static_bank, kUniqueId);
-    BrakmorphDsp* engine = dsp.release();  // the plug-in owns the engine from here
+    plugin = new Vst2WinPlugin(host, dsp.get(), gui.get(), receiver, static_bank, kUniqueId);
+    BrakmorphDsp* engine = dsp.release();  // the plug-in owns the engine and the editor from here
+    BrakmorphGui* editor = gui.release();
 
     host_dsp->set_plugin(plugin);
     engine->set_host_dsp(host_dsp.release());  // the engine owns its adapter
+    host_gui->set_plugin(plugin);
+    editor->set_host_gui(host_gui.release());  // the editor owns its adapter
+    engine->set_gui(editor);
+    editor->set_dsp(engine);
 
     plugin->set_setting_key(kSettingKey);
     plugin->init_instance();

@@ -106,11 +106,15 @@ TEST_F(PluginRecord, IdentityTexts) {
   EXPECT_EQ(dispatch(effect_, effGetTailSize), 0);
   EXPECT_EQ(dispatch(effect_, effKeysRequired), 0);
   EXPECT_EQ(dispatch(effect_, effConnectInput, 0, 1), 1);
-  // Without an editor the editor opcodes answer 0.
+  // The editor answers its size; without a parent window it does not open, and
+  // key presses stay with the host.
   ERect* rect = nullptr;
-  EXPECT_EQ(dispatch(effect_, effEditGetRect, 0, 0, &rect), 0);
+  EXPECT_EQ(dispatch(effect_, effEditGetRect, 0, 0, &rect), 1);
+  ASSERT_NE(rect, nullptr);
+  EXPECT_EQ(rect->right, 609);
+  EXPECT_EQ(rect->bottom, 282);
   EXPECT_EQ(dispatch(effect_, effEditOpen), 0);
-  EXPECT_EQ(dispatch(effect_, effEditKeyDown, 65), 0);
+  EXPECT_EQ(dispatch(effect_, effEditKeyDown, 65), -1);
 }
 
 // The effect takes MIDI, so the MIDI abilities answer yes; the answers of an
