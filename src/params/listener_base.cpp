@@ -7,7 +7,7 @@
 namespace plugcore {
 
 bool ListenerBase::can_change(int32_t origin) {
-  return is_bound() ? host_gui_->can_set_param(index_, origin) : true;
+  return is_bound() && !refreshing_ ? host_gui_->can_set_param(index_, origin) : true;
 }
 
 void ListenerBase::hold_change(int32_t origin) {
@@ -31,7 +31,10 @@ void ListenerBase::bind_param(int32_t index, NormalizedParamInterface* param) {
 bool ListenerBase::refresh() {
   guikit::ControlInterface* control = get_control();
   if (control == nullptr || param_ == nullptr) return false;
-  return control->set_value(param_->get_norm(), guikit::kOriginSync);
+  refreshing_ = true;
+  const bool shown = control->set_value(param_->get_norm(), guikit::kOriginSync);
+  refreshing_ = false;
+  return shown;
 }
 
 }  // namespace plugcore

@@ -16,7 +16,8 @@ class NormalizedParamInterface;
 // again, which is what keeps the editor from echoing host or MIDI writes.
 class ListenerBase : public guikit::DefaultEventListener {
  public:
-  // Answers the adapter's can_set_param(index, origin); true while unbound.
+  // Answers the adapter's can_set_param(index, origin); true while unbound and
+  // during refresh.
   bool can_change(int32_t origin) override;
   // lock_param(index, origin): a held mouse button keeps the parameter.
   void hold_change(int32_t origin) override;
@@ -35,8 +36,10 @@ class ListenerBase : public guikit::DefaultEventListener {
   NormalizedParamInterface* use_param() const { return param_; }
 
   // Pushes the parameter's normalised value into the control as a change from
-  // outside with the synchronisation origin (1). Answers false when there is no
-  // control or parameter, or when the change was refused.
+  // outside with the synchronisation origin (1). It writes nothing, so it is not
+  // arbitrated: a bare set_value(v, 1) would be refused for 0.5 s after any
+  // stronger write and leave the control stale. Answers false when there is no
+  // control or parameter, or when another listener of the control refused.
   bool refresh();
 
  private:
@@ -45,6 +48,7 @@ class ListenerBase : public guikit::DefaultEventListener {
   HostGuiInterface* host_gui_ = nullptr;
   int32_t index_ = -1;
   NormalizedParamInterface* param_ = nullptr;
+  bool refreshing_ = false;
 };
 
 }  // namespace plugcore
