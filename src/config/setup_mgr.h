@@ -49,7 +49,8 @@ class SetupMgr {
   // ports, so the port submenus are filled (from the selection given with
   // set_port_selection). Answers 0, or the setting manager's status.
   // Calling it again (the editor reopened) rebuilds the tree; the auto-bind
-  // manager keeps its listeners and state.
+  // manager keeps its listeners and state. The button must outlive the
+  // manager, which takes its listener off the button when it goes.
   int init(GuiInterface& editor, MidiMgr* midi_mgr, guikit::ControlInterface& button, WebSiteJumpInterface* web,
            int with_ports);
   // The MIDI port selection the port submenus show and change; null: none.
