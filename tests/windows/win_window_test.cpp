@@ -84,6 +84,62 @@ int count_differences(const std::vector<uint32_t>& a, const std::vector<uint32_t
   return n;
 }
 
+// Keeps the mouse messages the window sends it.
+class MouseRecorder : public guikit::MessageHandlerInterface {
+ public:
+  int32_t process_message(guikit::MessageInterface& message) override {
+    if (auto* click = dynamic_cast<guikit::MouseClick*>(&message)) clicks.push_back(*click);
+    if (auto* move = dynamic_cast<guikit::MouseMove*>(&message)) moves.push_back(*move);
+    if (dynamic_cast<guikit::MouseCaptureLost*>(&message)) ++lost;
+    return 0;
+  }
+  std::vector<guikit::MouseClick> clicks;
+  std::vector<guikit::MouseMove> moves;
+  int lost = 0;
+};
+
+// The window procedure's reading of buttons, modifiers, double-clicks and
+// positions, and a capture another window takes away.
+void check_mouse_messages(win_test::Desktop& desktop, WindowWin32& window, HWND child) {
+  MouseRecorder recorder;
+  window.set_roots(nullptr, &recorder);
+  struct Case {
+    UINT message;
+    WPARAM keys;
+    uint32_t buttons, modifiers, double_click;
+  };
+  const Case cases[] = {
+      {WM_LBUTTONDOWN, MK_LBUTTON | MK_CONTROL, guikit::kButtonLeft, guikit::kModControl, 0},
+      {WM_LBUTTONUP, MK_SHIFT, 0, guikit::kModShift, 0},
+      {WM_LBUTTONDBLCLK, MK_LBUTTON, guikit::kButtonLeft, 0, guikit::kDoubleLeft},
+      {WM_RBUTTONDBLCLK, MK_RBUTTON | MK_SHIFT | MK_CONTROL, guikit::kButtonRight, 3, guikit::kDoubleRight},
+      {WM_MBUTTONDOWN, MK_MBUTTON | MK_LBUTTON, guikit::kButtonMiddle | guikit::kButtonLeft, 0, 0},
+      {WM_MBUTTONDBLCLK, MK_MBUTTON, guikit::kButtonMiddle, 0, guikit::kDoubleMiddle},
+      {WM_RBUTTONUP, MK_MBUTTON, guikit::kButtonMiddle, 0, 0},
+  };
+  for (const Case& c : cases) PostMessageA(child, c.message, c.keys, MAKELPARAM(-5, 300));
+  PostMessageA(child, WM_MOUSEMOVE, 0, MAKELPARAM(12, -7));
+  desktop.pump(50);
+  bool all = recorder.clicks.size() == sizeof cases / sizeof cases[0];
+  for (size_t i = 0; all && i < recorder.clicks.size(); ++i) {
+    const guikit::MouseClick& m = recorder.clicks[i];
+    all = m.buttons == cases[i].buttons && m.modifiers == cases[i].modifiers &&
+          m.double_click == cases[i].double_click && m.position.x == -5 && m.position.y == 300;
+  }
+  check(all, "mouse buttons, modifiers and double-clicks come from the key-state word; positions are signed");
+  check(recorder.moves.size() == 1 && recorder.moves[0].position.x == 12 && recorder.moves[0].position.y == -7,
+        "a mouse move reaches the control tree with its signed position");
+
+  guikit::MouseCapture capture(1, &recorder);
+  check(window.process_message(capture) == 0 && GetCapture() == child, "a capture request takes the system capture");
+  SetCapture(GetParent(child));
+  desktop.pump(20);
+  check(recorder.lost == 1 && window.core().get_capture_handler() == nullptr,
+        "another window taking the capture tells the handler it lost it");
+  ReleaseCapture();
+  window.set_roots(nullptr, nullptr);
+}
+
 // --- Pop-up menus: a timer inside the menu's modal loop reads the menu the
 // system shows and answers with keys.
 struct MenuDriver {
@@ -299,6 +355,9 @@ int main(int argc, char** argv) {
   desktop.pump(100);
   check(count_differences(desktop.screenshot(child, kEditorSize), offscreen_reference(0, 0, 0, 1, "Brakmorph")) == 0,
         "the switched flip-flop is on the screen");
+
+  check_mouse_messages(desktop, *window, child);
+  scene->attach(*window);
 
   // A drag upwards on the first knob, in relative mode, and its glide.
   {
