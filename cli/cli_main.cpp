@@ -21,6 +21,7 @@ const Command kCommands[] = {
     {"info", plugcore::run_info},   {"render", plugcore::run_render},
     {"demo", plugcore::run_demo},   {"bench", plugcore::run_bench},
     {"bank", plugcore::run_bank},   {"validate", plugcore::run_validate},
+    {"snapshot", plugcore::run_snapshot}, {"edit", plugcore::run_edit},
 };
 
 bool wants_help(const std::vector<std::string>& args) {

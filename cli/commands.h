@@ -17,6 +17,8 @@ int run_demo(basic::ArgReader& args);
 int run_bench(basic::ArgReader& args);
 int run_bank(basic::ArgReader& args);
 int run_validate(basic::ArgReader& args);
+int run_snapshot(basic::ArgReader& args);
+int run_edit(basic::ArgReader& args);
 
 // Help texts: the overview for an empty name, else the command's own; empty
 // when there is no such command.

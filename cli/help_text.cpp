@@ -26,6 +26,8 @@ const HelpEntry kHelp[] = {
      "  bench     measure processing CPU time, several configurations side by side\n"
      "  bank      show the programs of a preset bank file\n"
      "  validate  run the host-grade validation battery on a plug-in\n"
+     "  snapshot  open the plug-in's editor in a window and save a PNG of it\n"
+     "  edit      open the plug-in's editor while a file plays through it\n"
      "\n"
      "'brakmorph COMMAND --help' describes a command. Failures exit non-zero with\n"
      "a one-line reason (status 2 for a command-line mistake).\n"},
@@ -94,7 +96,7 @@ const HelpEntry kHelp[] = {
      "Drives the plug-in the way the strictest hosts do and prints one line per\n"
      "check (PASS, FAIL or SKIP with the reason), then \"N passed, N failed\".\n"
      "Exits 1 when any check failed. Groups: lifecycle, dispatcher, audio,\n"
-     "threads, state, realtime.\n"
+     "threads, state, realtime, editor (skipped without a desktop).\n"
      "  --strictness  how many trials each check makes (10, the default, is the most)\n"
      "  --seed        seed of every random choice (default 1)\n"
      "  --only        run only the named groups\n"
@@ -107,6 +109,22 @@ const HelpEntry kHelp[] = {
      "display texts. A bad file is reported with its status code: -1002 cannot open,\n"
      "-1005 short header, -1009 short block, -1010 bad magic, -1007 refused by the\n"
      "plug-in.\n"},
+    {"snapshot",
+     "usage: brakmorph snapshot --out FILE.png [--plugin P] [--program N] [--set NAME=TEXT]...\n"
+     "                          [--norm INDEX=VALUE]... [--idle SECONDS]\n"
+     "\n"
+     "Applies the settings, asks the editor for its size, makes a window of that\n"
+     "size as the editor's parent, opens the editor in it, idles it every 20 ms\n"
+     "for --idle seconds (default 0.3) so it paints, grabs the window and writes\n"
+     "an RGB PNG. Needs a desktop (DISPLAY; xvfb-run works).\n"},
+    {"edit",
+     "usage: brakmorph edit [--plugin P] [--in IN.wav] [--program N] [--set NAME=TEXT]...\n"
+     "                      [--norm INDEX=VALUE]... [--seconds S]\n"
+     "\n"
+     "Opens the editor in a window for trying it by hand. A second thread plays\n"
+     "IN (default: the demo signal) through the plug-in in a loop at the pace of\n"
+     "real time, so meters move; nothing is heard. Ends when the window is closed\n"
+     "or after --seconds, and prints how many blocks were played.\n"},
 };
 
 }  // namespace

@@ -19,10 +19,15 @@ file(GLOB CLI_SOURCES CONFIGURE_DEPENDS ${BRAKMORPH_CLI_ROOT}/cli/*.cpp
      ${BRAKMORPH_CLI_ROOT}/cli/validate/*.cpp ${BRAKMORPH_CLI_ROOT}/cli/validate/linux/*.cpp)
 list(REMOVE_ITEM CLI_SOURCES ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
 
+# The editor commands: an X window as the editor's parent, grabs saved as PNG.
+pkg_check_modules(CLI_X11 REQUIRED IMPORTED_TARGET x11)
+pkg_check_modules(CLI_PNG REQUIRED IMPORTED_TARGET libpng)
+
 add_library(brakmorph_cli STATIC ${CLI_SOURCES})
 target_include_directories(brakmorph_cli PUBLIC ${BRAKMORPH_CLI_ROOT} ${BRAKMORPH_CLI_ROOT}/src)
 find_package(Threads REQUIRED)
-target_link_libraries(brakmorph_cli PUBLIC ${BRAKMORPH_SNDFILE_LIB} ${CMAKE_DL_LIBS} Threads::Threads)
+target_link_libraries(brakmorph_cli PUBLIC ${BRAKMORPH_SNDFILE_LIB} PkgConfig::CLI_X11 PkgConfig::CLI_PNG
+                      ${CMAKE_DL_LIBS} Threads::Threads)
 
 add_executable(brakmorph ${BRAKMORPH_CLI_ROOT}/cli/cli_main.cpp)
 target_link_libraries(brakmorph PRIVATE brakmorph_cli)
@@ -38,6 +43,8 @@ endif()
 
 # The fake plug-in the host's tests run on.
 include(${BRAKMORPH_CLI_ROOT}/tests/cli/fake_plugin/CMakeLists.txt)
+# The plug-in with a plain X11 editor the editor commands' tests run on.
+include(${BRAKMORPH_CLI_ROOT}/tests/cli/fake_editor_plugin/CMakeLists.txt)
 # The faulty plug-in the validation battery's tests run on.
 include(${BRAKMORPH_CLI_ROOT}/tests/validate/fake_plugin/CMakeLists.txt)
 
@@ -54,6 +61,13 @@ function(brakmorph_cli_wire_tests)
     target_compile_definitions(brakmorph_tests PRIVATE
       BRAKMORPH_TEST_FAKE_PLUGIN="$<TARGET_FILE:FakeGain>"
       BRAKMORPH_TEST_FAKE_PLUGIN_MAIN_ONLY="$<TARGET_FILE:FakeGainMainOnly>")
+  endif()
+  if(TARGET FakeEditor AND TARGET FakeEditorLeak)
+    add_dependencies(brakmorph_tests FakeEditor FakeEditorLeak)
+    target_compile_definitions(brakmorph_tests PRIVATE
+      BRAKMORPH_TEST_FAKE_EDITOR="$<TARGET_FILE:FakeEditor>"
+      BRAKMORPH_TEST_FAKE_EDITOR_LEAK="$<TARGET_FILE:FakeEditorLeak>"
+      BRAKMORPH_TEST_SNAPSHOT_DIR="${CMAKE_BINARY_DIR}/snapshots")
   endif()
 endfunction()
 cmake_language(DEFER DIRECTORY ${CMAKE_SOURCE_DIR} CALL brakmorph_cli_wire_tests)

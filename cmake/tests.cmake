@@ -85,6 +85,27 @@ if(TARGET brakmorph)
                    --tool $<TARGET_FILE:ardour_wav_tool> --work ${INTEGRATION_WORK}/ardour_session)
   set_tests_properties(integration.ardour_session
                        PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 240)
+  # Editors in real X windows on a virtual server: the editor commands' tests
+  # (the snapshots stay in snapshots/ of the build tree) and the validator's
+  # editor checks on the plug-in.
+  add_test(NAME integration.editor_xvfb
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/cli/run_under_xvfb.sh
+                   $<TARGET_FILE:brakmorph_tests> --gtest_filter=EditorHost* --gtest_brief=1)
+  add_test(NAME integration.validate_editor_xvfb
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/cli/run_under_xvfb.sh
+                   $<TARGET_FILE:brakmorph> validate --only editor --plugin $<TARGET_FILE:Brakmorph>)
+  set_tests_properties(integration.editor_xvfb integration.validate_editor_xvfb
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 120)
+  # The Windows builds' editors under Wine on a virtual X server, sharing the
+  # Wine prefix of the other Windows tests.
+  add_test(NAME integration.wine_snapshots
+           COMMAND bash ${CMAKE_SOURCE_DIR}/tests/cli/wine_snapshots.sh
+                   --prefix ${INTEGRATION_WORK}/wine/prefix
+                   --windows-builds "${BRAKMORPH_WINDOWS_BUILD_PATH}"
+                   --out ${CMAKE_BINARY_DIR}/snapshots --tests $<TARGET_FILE:brakmorph_tests>)
+  set_tests_properties(integration.wine_snapshots
+                       PROPERTIES LABELS integration SKIP_RETURN_CODE 77 TIMEOUT 600
+                       RESOURCE_LOCK wine_prefix)
   # The editor window of each Windows build on a private X server.
   add_test(NAME integration.wine_window
            COMMAND bash ${INTEGRATION_DIR}/wine_window.sh

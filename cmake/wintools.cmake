@@ -9,9 +9,13 @@ add_executable(win_render_host
   ${BRAKMORPH_WINTOOLS_ROOT}/cli/param_lookup.cpp
   ${BRAKMORPH_WINTOOLS_ROOT}/cli/render_loop.cpp
   ${BRAKMORPH_WINTOOLS_ROOT}/cli/raw_audio.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/validate/editor_session.cpp
+  ${BRAKMORPH_WINTOOLS_ROOT}/cli/validate/win32/editor_parent_win32.cpp
   ${BRAKMORPH_WINTOOLS_ROOT}/cli/win32/dynamic_module_win32.cpp)
 target_include_directories(win_render_host PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
                            ${BRAKMORPH_WINTOOLS_ROOT}/src)
+# The snapshot mode copies the editor's window with GDI.
+target_link_libraries(win_render_host PRIVATE gdi32)
 target_link_options(win_render_host PRIVATE -static -static-libgcc -static-libstdc++)
 set_target_properties(win_render_host PROPERTIES SUFFIX ".exe"
                       RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
@@ -31,6 +35,8 @@ add_executable(brakmorph_validate
   ${BRAKMORPH_WINTOOLS_ROOT}/cli/win32/dynamic_module_win32.cpp)
 target_include_directories(brakmorph_validate PRIVATE ${BRAKMORPH_WINTOOLS_ROOT}
                            ${BRAKMORPH_WINTOOLS_ROOT}/src)
+# The editor checks make parent windows; their grab uses GDI.
+target_link_libraries(brakmorph_validate PRIVATE gdi32)
 target_link_options(brakmorph_validate PRIVATE -static -static-libgcc -static-libstdc++)
 set_target_properties(brakmorph_validate PROPERTIES SUFFIX ".exe"
                       RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)

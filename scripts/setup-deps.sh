@@ -6,7 +6,7 @@ set -euo pipefail
 packages=(
   cmake make g++ clang libclang-rt-14-dev
   libgtest-dev libsndfile1-dev libasound2-dev pkg-config
-  libcairo2-dev libfreetype-dev libimagequant-dev fonts-dejavu-core
+  libcairo2-dev libfreetype-dev libx11-dev libpng-dev libimagequant-dev fonts-dejavu-core
   g++-mingw-w64-i686 g++-mingw-w64-x86-64 binutils-mingw-w64-i686 binutils-mingw-w64-x86-64
   wine wine64 wine32:i386 xvfb xauth libx11-dev libxtst-dev libpng-dev x11-utils
   ardour lsp-plugins-vst

@@ -21,6 +21,7 @@ const Group kGroups[] = {
     {"lifecycle", run_lifecycle_checks}, {"dispatcher", run_dispatcher_checks},
     {"audio", run_audio_checks},         {"threads", run_thread_checks},
     {"state", run_state_checks},         {"realtime", run_realtime_checks},
+    {"editor", run_editor_checks},
 };
 
 const char* status_word(CheckStatus status) {

@@ -12,6 +12,7 @@ void run_audio_checks(const ValidateOptions& options, CheckRecorder& recorder);
 void run_thread_checks(const ValidateOptions& options, CheckRecorder& recorder);
 void run_state_checks(const ValidateOptions& options, CheckRecorder& recorder);
 void run_realtime_checks(const ValidateOptions& options, CheckRecorder& recorder);
+void run_editor_checks(const ValidateOptions& options, CheckRecorder& recorder);
 
 // Runs check, turning an exception into a FAIL line for name.
 template <typename Check>
