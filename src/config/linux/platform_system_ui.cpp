@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "config/linux/fallback_dialogs_x11.h"
 #include "config/system_ui.h"
 
 extern char** environ;
@@ -120,10 +121,11 @@ class DesktopSystemUi : public SystemUiInterface {
     FileDialogResult result;
     result.filter_index = request.filter_index;
     result.status = -1024;
-    if (!has_display() || !tools_allowed()) return result;
+    if (!has_display()) return result;
     std::vector<std::string> args;
     const std::string start = join_path(request.directory, request.file_name);
-    if (on_path("zenity")) {
+    const bool tools = tools_allowed();
+    if (tools && on_path("zenity")) {
       args = {"zenity", "--file-selection", "--title=" + request.title};
       if (request.save) args.push_back("--save");
       if (!start.empty()) args.push_back("--filename=" + start);
@@ -131,7 +133,7 @@ class DesktopSystemUi : public SystemUiInterface {
         const FileFilter& f = request.filters[(i + static_cast<size_t>(request.filter_index)) % request.filters.size()];
         args.push_back("--file-filter=" + f.description + " | " + patterns(f.pattern));
       }
-    } else if (on_path("kdialog")) {
+    } else if (tools && on_path("kdialog")) {
       args = {"kdialog", request.save ? "--getsavefilename" : "--getopenfilename", start.empty() ? "." : start};
       std::string filter;
       for (const FileFilter& f : request.filters) {
@@ -141,7 +143,8 @@ class DesktopSystemUi : public SystemUiInterface {
       if (!filter.empty()) args.push_back(filter);
       if (!request.title.empty()) args.insert(args.end(), {"--title", request.title});
     } else {
-      return result;
+      // Neither program (or they are switched off): the dialog we draw ourselves.
+      return run_fallback_file_dialog(request);
     }
     RunResult r = run(args);
     if (!r.started) return result;
@@ -157,18 +160,19 @@ class DesktopSystemUi : public SystemUiInterface {
 
   int32_t show_message_box(const std::string& title, const std::string& text, int32_t buttons,
                            int32_t default_button) override {
-    if (!has_display() || !tools_allowed()) return -1;
+    if (!has_display()) return -1;
     std::vector<std::string> args;
-    if (on_path("zenity")) {
+    const bool tools = tools_allowed();
+    if (tools && on_path("zenity")) {
       const char* kind = buttons == 0 ? "--info" : "--question";
       args = {"zenity", kind, "--title=" + title, "--text=" + text, "--no-markup"};
       if (buttons == 1) args.insert(args.end(), {"--ok-label=OK", "--cancel-label=Cancel"});
       if (buttons == 2) args.insert(args.end(), {"--ok-label=Yes", "--cancel-label=No"});
       if (buttons != 0 && default_button == 1) args.push_back("--default-cancel");
-    } else if (on_path("kdialog")) {
+    } else if (tools && on_path("kdialog")) {
       args = {"kdialog", "--title", title, buttons == 0 ? "--msgbox" : (buttons == 1 ? "--okcancel" : "--yesno"), text};
     } else {
-      return -1;
+      return show_fallback_message_box(title, text, buttons, default_button);
     }
     RunResult r = run(args);
     if (!r.started || r.exit_status < 0) return -1;
