@@ -189,9 +189,9 @@ void GuiMaster::build_band(EditorTrees& trees, int b) {
   }
 
   const std::string stem = "vn_0" + std::to_string(b + 1);
-  band.needle.set_background(slot(stem + "_p", anchor(kSkinMeterFace)));
-  band.needle.set_needle(slot(stem, anchor(kSkinNeedle)));
-  band.needle.set_cover(slot(stem + "_o", anchor(kSkinMeterCover)));
+  // The skin's needle stands upright and turns about its own pivot.
+  band.needle.set_skin(slot(stem + "_p", anchor(kSkinMeterFace)), slot(stem, Point{0, 0}),
+                       slot(stem + "_o", anchor(kSkinMeterCover)), kSkinNeedle.pivot_x, kSkinNeedle.pivot_y);
   band.needle.set_geometry(0.3175, -0.135, Point{0, 0}, 4.0);
   band.needle.set_refresh_period(0.04f);
   VuMeterListener& meter = meters_[static_cast<size_t>(b)];

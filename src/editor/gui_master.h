@@ -11,6 +11,7 @@
 #include "editor/gui_part.h"
 #include "editor/peak_listener.h"
 #include "editor/rc_mgr.h"
+#include "editor/skin_needle.h"
 #include "editor/vu_meter_listener.h"
 #include "guikit/diode.h"
 #include "guikit/fader.h"
@@ -44,7 +45,7 @@ class GuiMaster : public GuiPart, public BandDisplayInterface {
 
   guikit::Knob& band_knob(int band, int slot) { return bands_[static_cast<size_t>(band)].knobs[static_cast<size_t>(slot)]; }
   guikit::Fader& split(int k) { return splits_[static_cast<size_t>(k)]; }
-  guikit::VuMeterNeedle& needle(int band) { return bands_[static_cast<size_t>(band)].needle; }
+  SkinNeedle& needle(int band) { return bands_[static_cast<size_t>(band)].needle; }
   FadingDiode& clip_diode() { return clip_; }
   VuMeterListener& meter_listener(int band) { return meters_[static_cast<size_t>(band)]; }
   RcMgr& band_link(int band, int slot) { return *links_[static_cast<size_t>(band * kLinkedSlots + slot)]; }
@@ -58,7 +59,7 @@ class GuiMaster : public GuiPart, public BandDisplayInterface {
   struct Band {
     std::array<guikit::Knob, kBandKnobs> knobs;
     guikit::FlipFlop solo;
-    guikit::VuMeterNeedle needle;
+    SkinNeedle needle;
   };
 
   void setup_knob(guikit::Knob& knob);
