@@ -20,7 +20,6 @@ local plugin_id = os.getenv("ROUTE_PLUGIN_ID")
 local program = tonumber(os.getenv("ROUTE_PROGRAM"))
 local param = tonumber(os.getenv("ROUTE_PARAM_INDEX"))
 local value = tonumber(os.getenv("ROUTE_PARAM_VALUE"))
-local record_us = math.floor(tonumber(os.getenv("ROUTE_RECORD_SECONDS")) * 1000000)
 
 local function fail(text)
   print("ROUTE FAIL " .. text)
@@ -65,6 +64,10 @@ local function export_master(length, label)
   if not export:check_outputs() then fail("nothing to export") end
   if not export:run_export() then fail("export " .. label) end
   print("ROUTE exported " .. label .. " " .. length)
+  -- The exporter goes while the session is still open, not whenever the
+  -- garbage collector gets to it.
+  export = nil
+  collectgarbage("collect")
 end
 
 AudioEngine:set_backend("None (Dummy)", "", "")
@@ -93,6 +96,7 @@ if mode == "create" then
   ARDOUR.LuaAPI.set_plugin_insert_param(insert, param, value)
   print(string.format("ROUTE param %d %.6f", param, ARDOUR.LuaAPI.get_plugin_insert_param(insert, param, true)))
 
+  local record_us = math.floor(tonumber(os.getenv("ROUTE_RECORD_SECONDS")) * 1000000)
   track:rec_enable_control():set_value(1, PBD.GroupControlDisposition.NoGroup)
   Session:maybe_enable_record(false)
   Session:request_roll(ARDOUR.TransportRequestSource.TRS_UI)
