@@ -101,6 +101,30 @@ TEST(EditorHostSnapshot, RefusesWhatCannotWork) {
   EXPECT_FALSE(std::filesystem::exists(out));
 }
 
+// Grabs survive the trip through a PNG file exactly; what is no PNG is refused.
+TEST(EditorHostPng, RoundTripsEveryPixelAndRefusesOtherFiles) {
+  cli_test::ScratchDir scratch;
+  plugcore::PixelImage image;
+  image.width = 37;  // odd sizes catch row padding mistakes
+  image.height = 11;
+  uint32_t state = 12345;
+  for (int i = 0; i < image.width * image.height; ++i) {
+    state = state * 1664525u + 1013904223u;
+    image.pixels.push_back(state >> 8);
+  }
+  const std::string path = scratch.file("grab.png");
+  plugcore::write_png(path, image);
+  const plugcore::PixelImage back = plugcore::read_png(path);
+  ASSERT_EQ(back.width, image.width);
+  ASSERT_EQ(back.height, image.height);
+  EXPECT_EQ(back.pixels, image.pixels);
+
+  cli_test::write_bytes(scratch.file("not.png"), {'n', 'o', 't', ' ', 'a', ' ', 'p', 'n', 'g'});
+  EXPECT_THROW(plugcore::read_png(scratch.file("not.png")), std::runtime_error);
+  EXPECT_THROW(plugcore::read_png(scratch.file("missing.png")), std::runtime_error);
+  EXPECT_THROW(plugcore::write_png(scratch.file("no/such/dir/grab.png"), image), std::runtime_error);
+}
+
 // edit plays the file in a loop at the pace of real time while the editor is
 // open: far fewer blocks than a free-running loop, about the real-time count.
 TEST(EditorHostEdit, PlaysTheInputInRealTimeWhileTheEditorIsOpen) {
