@@ -127,14 +127,3 @@ if(XVFB_RUN)
   set_tests_properties(x11_window PROPERTIES LABELS window TIMEOUT 120
                        ENVIRONMENT "BRAKMORPH_SCREENSHOT_DIR=${CMAKE_BINARY_DIR}/screenshots;BRAKMORPH_NO_DESKTOP_TOOLS=1")
 endif()
-
-# The editor window on a real X server: a virtual one, started for the run.
-# XTest drives the pointer and keys; the screenshots are written as PNG.
-target_link_libraries(brakmorph_tests PRIVATE Xtst png)
-find_program(XVFB_RUN xvfb-run)
-if(XVFB_RUN)
-  add_test(NAME x11_window
-           COMMAND ${XVFB_RUN} -a -s "-screen 0 1024x768x24" $<TARGET_FILE:brakmorph_tests> --gtest_filter=X11*)
-  set_tests_properties(x11_window PROPERTIES LABELS window TIMEOUT 120
-                       ENVIRONMENT "BRAKMORPH_SCREENSHOT_DIR=${CMAKE_BINARY_DIR}/screenshots;BRAKMORPH_NO_DESKTOP_TOOLS=1")
-endif()
