@@ -46,9 +46,27 @@ void RcMgr::take_limits() {
   }
 }
 
+void RcMgr::release_linked() {
+  if (finder_ == nullptr) return;
+  const int own_band = band_of(index_);
+  const int slot = slot_of(index_);
+  for (int c = 0; c < kNbrBands; ++c) {
+    if (c == own_band) continue;
+    guikit::ControlInterface* other = finder_->find_param_control(param_of(c, slot));
+    guikit::EventListenerInterface* listener = other != nullptr ? other->get_first_listener() : nullptr;
+    if (listener != nullptr) listener->end_change(guikit::kOriginMouse);
+  }
+}
+
 void RcMgr::on_before_message(guikit::MessageInterface& message) {
   auto* click = dynamic_cast<guikit::MouseClick*>(&message);
-  if (click == nullptr || click->buttons == 0) return;  // a button going up keeps the mode
+  if (click == nullptr) return;
+  if (click->buttons == 0) {
+    // A button going up keeps the mode, and gives the linked bands back like
+    // the dragged one, so the glide after release reaches them too.
+    if (linked_) release_linked();
+    return;
+  }
   linked_ = (click->buttons & guikit::kButtonRight) != 0;
   relative_ = (click->modifiers & guikit::kModShift) != 0;
   mirrored_ = (click->modifiers & guikit::kModControl) != 0;

@@ -55,6 +55,7 @@ class RcMgr : public guikit::MiscMgrInterface {
   guikit::ControlInterface* own_control() const;
   bool gesture_live() const;
   void take_limits();
+  void release_linked();
 
   ParamControlFinderInterface* finder_;
   int index_;

@@ -47,6 +47,21 @@ TEST_F(LinkedEditor, RightButtonDragMovesTheSameControlOfEveryBand) {
   EXPECT_GT(automations_of(kDistAmnt), 0) << "the linked bands are written like the dragged one";
 }
 
+TEST_F(LinkedEditor, TheGlideAfterAQuickReleaseReachesTheLinkedBandsToo) {
+  window->mouse_move(291, 197);
+  window->button_down(guikit::kButtonRight);
+  for (int step = 0; step < 4; ++step) {
+    window->move_by(0, -12);
+    window->advance_ms(10);  // faster than the glide: the knob lags behind the mouse
+  }
+  window->button_up(guikit::kButtonRight);
+  const float at_release = norm(kDistAmnt + 7);
+  window->advance_ms(600);
+  const float v = norm(kDistAmnt + 7);
+  ASSERT_GT(v, at_release + 0.01f) << "the knob glides on after the release";
+  for (int c : {0, 2, 3}) EXPECT_FLOAT_EQ(norm(kDistAmnt + 7 * c), v) << "band " << c + 1;
+}
+
 TEST_F(LinkedEditor, ControlMirrorsTheLinkedBands) {
   drag_band2(guikit::kModControl);
   const float v = norm(kDistAmnt + 7);
