@@ -12,5 +12,7 @@ void GuiWeb::build(EditorTrees& trees) {
 int GuiWeb::init() {
   plugcore::HostGuiInterface* host_gui = gui_.get_host_gui();
   plugcore::MidiMgr* midi = host_gui != nullptr ? host_gui->use_midi_mgr() : nullptr;
+  // The port submenus list what the plug-in's port choice offers.
+  setup_.set_port_selection(host_gui != nullptr ? host_gui->use_midi_dev_selector() : nullptr);
   return setup_.init(gui_, midi, setup_button_, &web_, 1);
 }

@@ -4,6 +4,7 @@
 
 namespace plugcore {
 
+class MidiDevSelectorInterface;
 class MidiMgr;
 class ProgramSlot;
 
@@ -22,6 +23,8 @@ class HostGuiInterface {
   virtual int resize_window(int width, int height) = 0;
   virtual std::string get_setting_path() = 0;
   virtual MidiMgr* use_midi_mgr() = 0;
+  // The choice of MIDI ports (the host's and the system's), or null without MIDI.
+  virtual MidiDevSelectorInterface* use_midi_dev_selector() = 0;
 };
 
 }  // namespace plugcore

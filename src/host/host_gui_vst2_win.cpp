@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "host/vst2_plugin.h"
+#include "midi/midi_dev_sel_dispatcher.h"
 
 namespace plugcore {
 
@@ -63,5 +64,7 @@ std::string HostGuiVst2Win::get_setting_path() {
 }
 
 MidiMgr* HostGuiVst2Win::use_midi_mgr() { return plugin_->use_midi_mgr(); }
+
+MidiDevSelectorInterface* HostGuiVst2Win::use_midi_dev_selector() { return plugin_->use_midi_dispatcher(); }
 
 }  // namespace plugcore

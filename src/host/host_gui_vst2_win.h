@@ -22,6 +22,7 @@ class HostGuiVst2Win : public HostGuiInterface {
   int resize_window(int width, int height) override;
   std::string get_setting_path() override;
   MidiMgr* use_midi_mgr() override;
+  MidiDevSelectorInterface* use_midi_dev_selector() override;
 
  private:
   Vst2Plugin* plugin_ = nullptr;

@@ -140,3 +140,24 @@ TEST_F(EditorInstance, SetupButtonOpensTheSetupMenu) {
   EXPECT_EQ(window->menu().get_show_count(), shows + 1);
   EXPECT_FALSE(window->menu().get_last_entries().empty());
 }
+
+// The editor hands the plug-in's MIDI port choice to the setup menu, so its
+// device submenus list the host's ports after "None".
+TEST_F(EditorInstance, SetupMenuListsThePluginsMidiPorts) {
+  ASSERT_TRUE(open_editor());
+  window->menu().choose_next(0);
+  window->mouse_move(356 + 181 + 20, 229 + 40 + 7);
+  window->button_down();
+  window->button_up();
+  const std::vector<guikit::MenuEntry>& entries = window->menu().get_last_entries();
+  std::vector<std::string> inputs;
+  bool in_inputs = false;
+  for (const guikit::MenuEntry& entry : entries) {
+    if (entry.kind == guikit::MenuEntry::kSubMenuBegin) in_inputs = entry.text == "Input device";
+    else if (entry.kind == guikit::MenuEntry::kSubMenuEnd) in_inputs = false;
+    else if (in_inputs && entry.kind == guikit::MenuEntry::kItem) inputs.push_back(entry.text);
+  }
+  ASSERT_GE(inputs.size(), 2u) << "None and at least the host's own input";
+  EXPECT_EQ(inputs[0], "None");
+  EXPECT_EQ(inputs[1], "VST MIDI In interface");
+}

@@ -42,6 +42,7 @@ class FakeHostGui : public plugcore::HostGuiInterface {
   int resize_window(int, int) override { return 0; }
   std::string get_setting_path() override { return {}; }
   plugcore::MidiMgr* use_midi_mgr() override { return nullptr; }
+  plugcore::MidiDevSelectorInterface* use_midi_dev_selector() override { return nullptr; }
 };
 
 class FakeGui : public plugcore::GuiInterface {
