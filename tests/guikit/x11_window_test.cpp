@@ -104,10 +104,12 @@ TEST(X11Window, OpensOnceAsAChildOfTheHostWindowAtTheChosenSize) {
   scene.detach();
 }
 
-TEST(X11Window, ABadParentIdAnswersMinusOne) {
+TEST(X11Window, ABadOrMissingParentAnswersMinusOne) {
   X11_REQUIRE_DISPLAY();
   WindowX11 window(kEditor);
   EXPECT_EQ(-1, window.open(reinterpret_cast<void*>(uintptr_t{0x7FFFFFF0})));
+  EXPECT_FALSE(window.is_open());
+  EXPECT_EQ(-1, window.open(nullptr));
   EXPECT_FALSE(window.is_open());
 }
 

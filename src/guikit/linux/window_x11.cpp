@@ -74,13 +74,14 @@ int WindowX11::get_open_count() { return g_open_windows.load(std::memory_order_r
 
 int32_t WindowX11::open(void* parent) {
   if (window_) return 0;
+  // The editor lives inside the host's window; without one there is nowhere to show it.
+  if (parent == nullptr) return -1;
   if (!display_) display_ = open_x_display();
   if (!display_) return -1;
   const int screen = DefaultScreen(display_);
   Visual* visual = DefaultVisual(display_, screen);
   const int depth = DefaultDepth(display_, screen);
-  Window parent_window =
-      parent ? static_cast<Window>(reinterpret_cast<uintptr_t>(parent)) : RootWindow(display_, screen);
+  const Window parent_window = static_cast<Window>(reinterpret_cast<uintptr_t>(parent));
   const Size size = at_least_one(can_resize_ ? core_.get_editor_size() : window_size_);
 
   XSetWindowAttributes attributes{};
