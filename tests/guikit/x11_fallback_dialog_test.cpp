@@ -2,6 +2,7 @@
 // asked for through the desktop services with the programs switched off, while a
 // second thread plays the user on a connection of its own (the dialogs run their
 // own modal loop) and always leaves them closed, with Escape as a last resort.
+#include "x11_screenshot_file.h"
 #include "x11_test_support.h"
 
 #include <png.h>
@@ -167,41 +168,7 @@ uint32_t button_edge(Display* d, Window w, int count, int index) {
   return px.empty() ? 0 : px[static_cast<size_t>((r.top + r.bottom) / 2) * s.width + r.left];
 }
 
-std::string screenshot_dir() {
-  const char* dir = std::getenv("BRAKMORPH_SCREENSHOT_DIR");
-  std::string d = dir && *dir ? dir : "screenshots";
-  mkdir(d.c_str(), 0755);
-  return d;
-}
-
-bool write_png(const std::string& path, const std::vector<uint32_t>& rgb, int w, int h) {
-  FILE* f = std::fopen(path.c_str(), "wb");
-  if (!f) return false;
-  png_structp png = png_create_write_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
-  png_infop info = png ? png_create_info_struct(png) : nullptr;
-  if (!png || !info || setjmp(png_jmpbuf(png))) {
-    png_destroy_write_struct(&png, &info);
-    std::fclose(f);
-    return false;
-  }
-  png_init_io(png, f);
-  png_set_IHDR(png, info, static_cast<png_uint_32>(w), static_cast<png_uint_32>(h), 8, PNG_COLOR_TYPE_RGB,
-               PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
-  png_write_info(png, info);
-  std::vector<png_byte> row(static_cast<size_t>(w) * 3);
-  for (int y = 0; y < h; ++y) {
-    for (int x = 0; x < w; ++x) {
-      const uint32_t p = rgb[static_cast<size_t>(y) * w + x];
-      row[3 * x] = static_cast<png_byte>(p >> 16);
-      row[3 * x + 1] = static_cast<png_byte>(p >> 8);
-      row[3 * x + 2] = static_cast<png_byte>(p);
-    }
-    png_write_row(png, row.data());
-  }
-  png_write_end(png, nullptr);
-  png_destroy_write_struct(&png, &info);
-  return std::fclose(f) == 0;
-}
+using x11_test::screenshot_dir;
 
 // Grabs the dialog once its pixels pass the check (or after 2 s), keeps it as a
 // PNG and answers its pixels. The window's own background is white until the
@@ -215,7 +182,7 @@ std::vector<uint32_t> screenshot(Display* d, Window w, const std::string& name,
     if (!px.empty() && px[0] != 0xFFFFFFu && (!ready || ready(px))) break;
     std::this_thread::sleep_for(std::chrono::milliseconds(10));
   }
-  EXPECT_TRUE(write_png(screenshot_dir() + "/" + name, px, s.width, s.height));
+  EXPECT_TRUE(x11_test::write_png(screenshot_dir(), name, px, s.width, s.height));
   return px;
 }
 

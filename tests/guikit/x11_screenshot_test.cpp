@@ -1,6 +1,7 @@
 // What the X server shows of the editor window equals the off-screen rendering of
 // the same scene in the same state, every pixel (red, green and blue); the
 // screenshots are kept as PNG files for people to look at.
+#include "x11_screenshot_file.h"
 #include "x11_test_support.h"
 
 #include <png.h>
@@ -46,41 +47,7 @@ std::vector<uint32_t> offscreen_pixels(const State& s) {
   return out;
 }
 
-std::string screenshot_dir() {
-  const char* dir = std::getenv("BRAKMORPH_SCREENSHOT_DIR");
-  std::string d = dir && *dir ? dir : "screenshots";
-  mkdir(d.c_str(), 0755);
-  return d;
-}
-
-bool write_png(const std::string& path, const std::vector<uint32_t>& rgb, int w, int h) {
-  FILE* f = std::fopen(path.c_str(), "wb");
-  if (!f) return false;
-  png_structp png = png_create_write_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
-  png_infop info = png ? png_create_info_struct(png) : nullptr;
-  if (!png || !info || setjmp(png_jmpbuf(png))) {
-    png_destroy_write_struct(&png, &info);
-    std::fclose(f);
-    return false;
-  }
-  png_init_io(png, f);
-  png_set_IHDR(png, info, static_cast<png_uint_32>(w), static_cast<png_uint_32>(h), 8, PNG_COLOR_TYPE_RGB,
-               PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
-  png_write_info(png, info);
-  std::vector<png_byte> row(static_cast<size_t>(w) * 3);
-  for (int y = 0; y < h; ++y) {
-    for (int x = 0; x < w; ++x) {
-      uint32_t p = rgb[static_cast<size_t>(y) * w + x];
-      row[3 * x] = static_cast<png_byte>(p >> 16);
-      row[3 * x + 1] = static_cast<png_byte>(p >> 8);
-      row[3 * x + 2] = static_cast<png_byte>(p);
-    }
-    png_write_row(png, row.data());
-  }
-  png_write_end(png, nullptr);
-  png_destroy_write_struct(&png, &info);
-  return std::fclose(f) == 0;
-}
+using x11_test::screenshot_dir;
 
 int count_differences(const std::vector<uint32_t>& a, const std::vector<uint32_t>& b) {
   if (a.size() != b.size()) return -1;
@@ -127,8 +94,8 @@ TEST(X11Screenshot, TheWindowShowsTheOffscreenPixels) {
     scene.detach();
   }
   const std::string dir = screenshot_dir();
-  EXPECT_TRUE(write_png(dir + "/x11_editor_window.png", shown_first, kW, kH));
-  EXPECT_TRUE(write_png(dir + "/x11_editor_window_after_input.png", shown_after, kW, kH));
+  EXPECT_TRUE(x11_test::write_png(dir, "x11_editor_window.png", shown_first, kW, kH));
+  EXPECT_TRUE(x11_test::write_png(dir, "x11_editor_window_after_input.png", shown_after, kW, kH));
 
   const std::vector<uint32_t> expected_first = offscreen_pixels(State{0.25, 0.75, 0.4, 0.0, "Screenshot"});
   const std::vector<uint32_t> expected_after = offscreen_pixels(after);
