@@ -49,7 +49,11 @@ uint32_t channel_value(unsigned long pixel, unsigned long mask) {
 class EditorParentX11 : public EditorParentInterface {
  public:
   EditorParentX11(int width, int height, const std::string& title) : width_(width), height_(height) {
-    display_ = XOpenDisplay(nullptr);
+    // A busy server may refuse a connection opened right after another one: try a few times.
+    for (int attempt = 0; attempt < 8 && display_ == nullptr; ++attempt) {
+      if (attempt > 0) std::this_thread::sleep_for(std::chrono::milliseconds(10 * attempt));
+      display_ = XOpenDisplay(nullptr);
+    }
     if (display_ == nullptr) throw std::runtime_error("cannot open the X display");
     const int screen = DefaultScreen(display_);
     window_ = XCreateSimpleWindow(display_, RootWindow(display_, screen), 0, 0,

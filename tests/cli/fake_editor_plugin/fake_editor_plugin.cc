@@ -11,11 +11,13 @@
 #include <X11/Xutil.h>
 
 #include <atomic>
+#include <chrono>
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <new>
+#include <thread>
 
 #include "host/vst2_abi.h"
 
@@ -79,7 +81,11 @@ void paint(FakeEditor& fake) {
 
 intptr_t open_editor(FakeEditor& fake, void* parent) {
   if (fake.window != 0 || parent == nullptr) return 0;
-  fake.display = XOpenDisplay(nullptr);
+  // A busy virtual server may refuse a connection opened right after another one.
+  for (int attempt = 0; attempt < 8 && fake.display == nullptr; ++attempt) {
+    if (attempt > 0) std::this_thread::sleep_for(std::chrono::milliseconds(10 * attempt));
+    fake.display = XOpenDisplay(nullptr);
+  }
   if (fake.display == nullptr) return 0;
   const Window parent_window = static_cast<Window>(reinterpret_cast<uintptr_t>(parent));
   fake.window = XCreateSimpleWindow(fake.display, parent_window, 0, 0, kWidth, kHeight, 0, 0, 0);
